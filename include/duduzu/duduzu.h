@@ -3,4 +3,5 @@
 
 #include "duduzu/list.h"
 #include "duduzu/pool.h"
+#include "duduzu/qelmsg.h"
 #include "duduzu/session.h"
