@@ -5,3 +5,4 @@
 #include "duduzu/pool.h"
 #include "duduzu/qelmsg.h"
 #include "duduzu/session.h"
+#include "duduzu/userobj.h"
