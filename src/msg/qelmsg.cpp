@@ -54,6 +54,14 @@ void setScreen(bool on) {
   if (qelMsgHandOver.stream) switchConsole(on);
 }
 
+// Quiet mode only: the console's screen types opened (or shut) again.
+template <size_t N>
+void setQuietScreen(bool open, const int (&types)[N]) {
+  if (!qelMsgHandOver.stream || !qelMsgHandOver.quiet) return;
+  switchTypes(open, Port::File::getCout(), types);
+  quietScreen = open;
+}
+
 // A status straight to the message stream, bypassing the dispatcher, while
 // messages are on and `when` holds.
 void streamStatus(bool when, int line, const char* fmt, va_list ap) {
@@ -83,17 +91,8 @@ void Qel_Msg::Enable() { setMessages(true); }
 void Qel_Msg::DisableScreen() { setScreen(false); }
 void Qel_Msg::EnableScreen() { setScreen(true); }
 
-void Qel_Msg::QuietDisableScreen() {
-  if (!qelMsgHandOver.stream || !qelMsgHandOver.quiet) return;
-  switchTypes(false, Port::File::getCout(), kQuietShutTypes);
-  quietScreen = false;
-}
-
-void Qel_Msg::QuietEnableScreen() {
-  if (!qelMsgHandOver.stream || !qelMsgHandOver.quiet) return;
-  switchTypes(true, Port::File::getCout(), kScreenTypes);
-  quietScreen = true;
-}
+void Qel_Msg::QuietDisableScreen() { setQuietScreen(false, kQuietShutTypes); }
+void Qel_Msg::QuietEnableScreen() { setQuietScreen(true, kScreenTypes); }
 
 bool Qel_Msg::IsQuietEnableScreen() { return qelMsgHandOver.quiet && quietScreen; }
 
