@@ -3,4 +3,6 @@
 
 #include "duduzu/list.h"
 #include "duduzu/pool.h"
+#include "duduzu/qelmsg.h"
 #include "duduzu/session.h"
+#include "duduzu/userobj.h"

@@ -11,6 +11,14 @@ struct QelMsgHandOver {
 
 extern QelMsgHandOver qelMsgHandOver;
 
-void SetQelMsgQuiet(bool quiet);
-void SetQelMsgStream(Port_MsgStream* stream);
-void SetQelMsgLogStream(Port::Stream* stream);
+// The setters are internal. Builds with tests make them visible so that the
+// message-control tests can hand state over the way the set-up does.
+#ifdef DUDUZU_TESTING
+#define DZ_TESTING_API __attribute__((visibility("default")))
+#else
+#define DZ_TESTING_API
+#endif
+
+DZ_TESTING_API void SetQelMsgQuiet(bool quiet);
+DZ_TESTING_API void SetQelMsgStream(Port_MsgStream* stream);
+DZ_TESTING_API void SetQelMsgLogStream(Port::Stream* stream);
