@@ -4,3 +4,4 @@
 #include "duduzu/list.h"
 #include "duduzu/pool.h"
 #include "duduzu/session.h"
+#include "duduzu/str.h"
