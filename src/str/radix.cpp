@@ -92,7 +92,7 @@ int CharIsOctal(char c) { return c >= '0' && c <= '7'; }
 int StrIsBinary(const char* s) { return checkSized(s, 'b', isBinaryDigit); }
 
 int StrIsOctal(const char* s) {
-  return allDigits(s, [](int c) { return c >= '0' && c <= '7'; });
+  return allDigits(s, [](int c) { return CharIsOctal(static_cast<char>(c)); });
 }
 
 int StrIsDecimal(const char* s) {

@@ -17,23 +17,15 @@ constexpr const char* kUnit = "../s/strutil";
 // Zero-filled block for a string of len characters (null when memory is out).
 char* newBlock(size_t len) { return static_cast<char*>(vzl_calloc(len + 1, 1)); }
 
-// New heap string holding the characters of s that keep() accepts.
-template <class Keep>
-char* copyKept(const char* s, Keep keep) {
-  char* r = newBlock(strlen(s));
-  if (!r) return nullptr;
-  char* w = r;
-  for (; *s; ++s)
-    if (keep(*s)) *w++ = *s;
-  return r;
-}
-
 int sign(int v) { return (v > 0) - (v < 0); }
 
 }  // namespace
 
 char* StrCopy(const char* s) {
-  return copyKept(s, [](char) { return true; });
+  size_t len = strlen(s);
+  char* r = newBlock(len);
+  if (r) memcpy(r, s, len);
+  return r;
 }
 
 void StrFree(char** p) {
@@ -146,8 +138,14 @@ char* StrChrSlash(const char* s) {
   return const_cast<char*>(r ? r : strrchr(s, '/'));
 }
 
+// The block is sized for s and zero-filled, so the result is terminated
+// however many characters are dropped.
 char* StrRemoveChar(char* s, char c) {
-  return copyKept(s, [c](char x) { return x != c; });
+  char* r = newBlock(strlen(s));
+  if (!r) return nullptr;
+  for (char* w = r; *s; ++s)
+    if (*s != c) *w++ = *s;
+  return r;
 }
 
 char* StrRemoveCharInFront(char* s, char c) {
