@@ -1,8 +1,10 @@
 // The whole public interface of libduduzu.
 #pragma once
 
+#include "duduzu/intutil.h"
 #include "duduzu/list.h"
 #include "duduzu/pool.h"
 #include "duduzu/qelmsg.h"
 #include "duduzu/session.h"
+#include "duduzu/str.h"
 #include "duduzu/userobj.h"
