@@ -3,5 +3,6 @@
 
 #include "duduzu/list.h"
 #include "duduzu/listset.h"
+#include "duduzu/listsort.h"
 #include "duduzu/pool.h"
 #include "duduzu/session.h"

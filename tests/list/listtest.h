@@ -52,16 +52,21 @@ inline int CmpRec(int* a, int* b) {
   calls.push_back({V(a), V(b)});
   return Cmp(a, b);
 }
-// Compares keys only (value / 1000), so equal keys can be told apart.
-inline int CtxKeyCmpRec(int* a, int* b, int* context) {
-  lastContext = context;
-  calls.push_back({V(a), V(b)});
-  return (V(a) / 1000 > V(b) / 1000) - (V(a) / 1000 < V(b) / 1000);
-}
 
 inline Vals RandomVals(std::mt19937& rng, int size, long range) {
   std::uniform_int_distribution<long> pick(1, range);
   Vals out(static_cast<size_t>(size));
   for (long& v : out) v = pick(rng);
   return out;
+}
+
+// Compares keys only (value / 1000), so that elements of equal keys can be told apart.
+inline int KeyCmp(int* a, int* b) { return (V(a) / 1000 > V(b) / 1000) - (V(a) / 1000 < V(b) / 1000); }
+inline int KeyCmpRec(int* a, int* b) {
+  calls.push_back({V(a), V(b)});
+  return KeyCmp(a, b);
+}
+inline int CtxKeyCmpRec(int* a, int* b, int* context) {
+  lastContext = context;
+  return KeyCmpRec(a, b);
 }
