@@ -40,9 +40,16 @@ void mergeRuns(int** e, int i, int mid, int hi, After& after) {
   }
   moveSlots(left->elements, e + i, n);
   left->count = n;
-  int t = 0, j = mid + 1, k = i;
-  while (t < n && j <= hi) e[k++] = after(left->elements[t], e[j]) ? e[j++] : left->elements[t++];
-  moveSlots(e + k, left->elements + t, n - t);  // the rest of the right run is in place
+  int **l = left->elements, **lEnd = l + n, **r = e + mid + 1, **rEnd = e + hi + 1, **out = e + i;
+  while (l < lEnd && r < rEnd) {
+    // Branch-free choice, as the outcome is unpredictable on unordered input.
+    int* choice[2] = {*l, *r};
+    bool takeRight = after(*l, *r);
+    *out++ = choice[takeRight];
+    r += takeRight;
+    l += !takeRight;
+  }
+  moveSlots(out, l, static_cast<int>(lEnd - l));  // the rest of the right run is in place
   ListQuickDelete(&left);
 }
 
