@@ -1,5 +1,5 @@
-// Shared helpers of the list tests: integer elements in pointer cells,
-// owned lists, and recording callbacks.
+// Shared helpers of the list tests: integer elements in pointer cells, owned
+// lists, recording callbacks and random data.
 #pragma once
 
 #include <gtest/gtest.h>
@@ -13,7 +13,7 @@
 #include "duduzu/duduzu.h"
 
 using Vals = std::vector<long>;
-using Call = std::pair<long, long>;
+using Calls = std::vector<std::pair<long, long>>;
 
 inline int* P(long v) { return reinterpret_cast<int*>(static_cast<intptr_t>(v)); }
 inline long V(const int* p) { return static_cast<long>(reinterpret_cast<intptr_t>(p)); }
@@ -35,38 +35,40 @@ inline Vals Of(const DomList* list) {
   return out;
 }
 
-// Every callback call, in order, as (first argument, second argument).
-inline std::vector<Call> calls;
+// The recording callbacks append (first argument, second argument) to `calls`.
+inline Calls calls;
 inline int* lastContext = nullptr;
+template <class F>
+Calls Recorded(F f) {
+  calls.clear();
+  f();
+  return calls;
+}
 
+inline int Eq(int* x, int* v) { return V(x) == V(v); }
 inline int EqRec(int* x, int* v) {
   calls.push_back({V(x), V(v)});
-  return V(x) == V(v);
+  return Eq(x, v);
 }
 inline int CtxEqRec(int* x, int* v, int* context) {
   lastContext = context;
   return EqRec(x, v);
 }
-inline int Cmp(int* a, int* b) { return (V(a) > V(b)) - (V(a) < V(b)); }
+// Three-way comparison of keys: value / 1000, so that elements of equal keys differ.
+inline int Cmp(int* a, int* b) { return (V(a) / 1000 > V(b) / 1000) - (V(a) / 1000 < V(b) / 1000); }
 inline int CmpRec(int* a, int* b) {
   calls.push_back({V(a), V(b)});
   return Cmp(a, b);
 }
-
-inline Vals RandomVals(std::mt19937& rng, int size, long range) {
-  std::uniform_int_distribution<long> pick(1, range);
-  Vals out(static_cast<size_t>(size));
-  for (long& v : out) v = pick(rng);
-  return out;
-}
-
-// Compares keys only (value / 1000), so that elements of equal keys can be told apart.
-inline int KeyCmp(int* a, int* b) { return (V(a) / 1000 > V(b) / 1000) - (V(a) / 1000 < V(b) / 1000); }
-inline int KeyCmpRec(int* a, int* b) {
-  calls.push_back({V(a), V(b)});
-  return KeyCmp(a, b);
-}
-inline int CtxKeyCmpRec(int* a, int* b, int* context) {
+inline int CtxCmpRec(int* a, int* b, int* context) {
   lastContext = context;
-  return KeyCmpRec(a, b);
+  return CmpRec(a, b);
+}
+
+// size values key * 1000 + id: keys from 1 to range, ids firstId, firstId + 1, ...
+inline Vals Keyed(std::mt19937& rng, int size, long range, long firstId = 0) {
+  std::uniform_int_distribution<long> key(1, range);
+  Vals out;
+  for (int i = 0; i < size; ++i) out.push_back(key(rng) * 1000 + firstId + i);
+  return out;
 }
