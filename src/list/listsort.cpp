@@ -16,6 +16,9 @@ int countOf(const DomList* list) { return list ? list->count : 0; }
 
 void moveSlots(int** to, int** from, int n) { memmove(to, from, sizeof(int*) * static_cast<size_t>(n)); }
 
+// True when a pair whose comparison gave r is out of the requested order.
+bool outOfOrder(int r, bool ascending) { return ascending ? r > 0 : r < 0; }
+
 // True when an element comparing r against the sought one lies on or after it
 // in the search's sense: the half [lo, mid] still holds the answer.
 bool searchLeft(int r, bool ascending) { return ascending ? r > 0 : r <= 0; }
@@ -49,24 +52,22 @@ void mergeRuns(int** e, int i, int mid, int hi, After& after) {
     r += takeRight;
     l += !takeRight;
   }
-  moveSlots(out, l, static_cast<int>(lEnd - l));  // the rest of the right run is in place
+  // The rest of the left run fills the gap; the rest of the right run is in place.
+  moveSlots(out, l, static_cast<int>(lEnd - l));
   ListQuickDelete(&left);
 }
 
 // Sorts slots [lo, hi] (at least two) with compare(x, y), the raw three-way
-// callback; sortThree(slots) handles ranges of exactly three.
+// callback; sortThree(slots, after) handles ranges of exactly three.
 template <class Compare, class SortThree>
 void sortRange(int** e, int lo, int hi, bool ascending, Compare& compare, SortThree& sortThree) {
-  auto after = [&](int* x, int* y) {
-    int r = compare(x, y);
-    return ascending ? r > 0 : r < 0;
-  };
+  auto after = [&](int* x, int* y) { return outOfOrder(compare(x, y), ascending); };
   if (hi == lo + 1) {
     if (after(e[lo], e[hi])) std::swap(e[lo], e[hi]);
     return;
   }
   if (hi == lo + 2) {
-    sortThree(e + lo);
+    sortThree(e + lo, after);
     return;
   }
   int mid = lo + (hi - lo) / 2;
@@ -110,7 +111,7 @@ void sortThreeByTree(int** s, bool ascending, ListCompareFn compare) {
 
 // Stable insertion of ListContextualSelfSort for three elements.
 template <class After>
-void sortThreeByInsertion(int** s, After after) {
+void sortThreeByInsertion(int** s, After& after) {
   if (after(s[0], s[1])) std::swap(s[0], s[1]);
   if (!after(s[1], s[2])) return;
   if (after(s[0], s[2])) {
@@ -197,17 +198,13 @@ void appendFrom(DomList* dest, DomList* src, int from) {
 
 void ListSelfSort(DomList* list, int ascending, ListCompareFn compare) {
   sortList(list, ascending, compare,
-           [=](int** s) { sortThreeByTree(s, ascending != 0, compare); });
+           [=](int** s, auto&) { sortThreeByTree(s, ascending != 0, compare); });
 }
 
 void ListContextualSelfSort(DomList* list, int ascending, ListContextualCompareFn compare,
                             int* context) {
-  auto after = [=](int* x, int* y) {
-    int r = compare(x, y, context);
-    return ascending ? r > 0 : r < 0;
-  };
   sortList(list, ascending, [=](int* x, int* y) { return compare(x, y, context); },
-           [=](int** s) { sortThreeByInsertion(s, after); });
+           [](int** s, auto& after) { sortThreeByInsertion(s, after); });
 }
 
 DomList* ListSort(DomList* list, int ascending, ListCompareFn compare, ListCopyFn copy) {
@@ -243,8 +240,7 @@ int ListContextualMemberOfSortedList(DomList* list, int* e, ListContextualCompar
 
 int ListCheckIfSortedList(DomList* list, ListCompareFn compare, int ascending) {
   for (int i = 0; i + 1 < countOf(list); ++i) {
-    int r = compare(list->elements[i], list->elements[i + 1]);
-    if (ascending ? r > 0 : r < 0) return 0;
+    if (outOfOrder(compare(list->elements[i], list->elements[i + 1]), ascending != 0)) return 0;
   }
   return 1;
 }
