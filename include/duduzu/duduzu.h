@@ -3,6 +3,8 @@
 
 #include "duduzu/intutil.h"
 #include "duduzu/list.h"
+#include "duduzu/listset.h"
+#include "duduzu/listsort.h"
 #include "duduzu/pool.h"
 #include "duduzu/qelmsg.h"
 #include "duduzu/session.h"

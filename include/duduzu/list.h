@@ -21,6 +21,9 @@ typedef int* (*ListCopyFn)(int* e);
 typedef int* (*ListContextualCopyFn)(int* e, int* context);
 typedef void (*ListPrintFn)(FILE* stream, int* e);
 typedef void (*ListContextualPrintFn)(FILE* stream, int* e, int* context);
+// Three-way comparison: negative when a sorts before b, 0 when equal, positive after.
+typedef int (*ListCompareFn)(int* a, int* b);
+typedef int (*ListContextualCompareFn)(int* a, int* b, int* context);
 
 // Creation and destruction.
 DUDUZU_API DomList* ListCreateWithSize(int size);

@@ -1,4 +1,5 @@
 // DomList core: creation, growth, removal, search by position, copy, print.
+#include <algorithm>
 #include <climits>
 #include <cstdint>
 #include <cstring>
@@ -24,9 +25,9 @@ void deleteWith(DomList** list, Free freeSlot) {
 template <class Match>
 int findWith(DomList* list, Match match) {
   if (!list) return 0;
-  for (int i = 0; i < list->count; ++i)
-    if (match(list->elements[i])) return i + 1;
-  return 0;
+  int** end = list->elements + list->count;
+  int** at = std::find_if(list->elements, end, match);  // unrolled scan
+  return at == end ? 0 : static_cast<int>(at - list->elements) + 1;
 }
 
 template <class Copy>
