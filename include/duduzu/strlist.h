@@ -3,8 +3,9 @@
 // A string list is a DomList of heap strings. Every list these routines create,
 // and every string they put into a list, belongs to the caller; release a list
 // with ListDelete(&list, ListElemFree). Input strings are copied, never kept.
-// The routines that allocate answer null (0 for StrInsertInList) when memory
-// runs out, having released whatever they had built.
+// When an allocation fails the routines answer null (0 for StrInsertInList),
+// having released whatever they had built; a list that cannot grow leaves
+// through ExitToSession like any list.
 #pragma once
 
 #include <cstdio>
