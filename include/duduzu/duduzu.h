@@ -9,4 +9,6 @@
 #include "duduzu/qelmsg.h"
 #include "duduzu/session.h"
 #include "duduzu/str.h"
+#include "duduzu/strlist.h"
+#include "duduzu/strname.h"
 #include "duduzu/userobj.h"
