@@ -2,5 +2,6 @@
 #pragma once
 
 #include "duduzu/list.h"
+#include "duduzu/mint.h"
 #include "duduzu/pool.h"
 #include "duduzu/session.h"
