@@ -1,7 +1,9 @@
 // The whole public interface of libduduzu.
 #pragma once
 
+#include "duduzu/intutil.h"
 #include "duduzu/list.h"
 #include "duduzu/mint.h"
 #include "duduzu/pool.h"
 #include "duduzu/session.h"
+#include "duduzu/str.h"
