@@ -8,6 +8,7 @@
 #include <cstdio>
 
 #include "duduzu/export.h"
+#include "duduzu/list.h"
 
 // Creation and copying. MintCreateNoInit allocates one spare zero cell beyond
 // `cells`; the others allocate exactly `cells` cells. Null after a
@@ -59,3 +60,28 @@ DUDUZU_API unsigned int MintIncrement(unsigned int* m, int cells);
 // The numbers of the set bits, each as " %d", by the main-output rule.
 DUDUZU_API void PrintBitsEqualTo1(FILE* f, unsigned int cell, int offset);
 DUDUZU_API void MintPrintBitsEqualTo1(FILE* f, unsigned int* m, int cells);
+
+// Text forms. Bases 2, 8, 10 and 16; prefixes "%B", "%O", "%D", "%H"; bases 2
+// and 16 also read as width'b... and width'h... (the width is ignored).
+//
+// Reads `text` in `base` (0: decimal when it starts with a digit, else by its
+// prefix). On success stores a new Mint (MintCreateNoInit-sized) and its cell
+// count and returns 1; returns 0 leaving both untouched for text that does not
+// fit, for a binary form beyond 9999 digits and for any other base.
+DUDUZU_API int MintFromStr(char const* text, unsigned int** result, int* cells, int base);
+// Writes m in `base` (0 and 10 decimal; 2, 8, 16) without leading zeros, hex
+// in upper case; `width` > 0 pads with zeros or keeps the leading digits;
+// `prefix` adds the base prefix. `text` holds max(digits, width) + 3 chars.
+// Any other base writes the empty text.
+DUDUZU_API void MintToStr(unsigned int* m, int cells, int width, int base, int prefix, char* text);
+// cell = low 32 bits of cell * 10 + carry; returns the high part.
+DUDUZU_API unsigned int MintMultiplyOneCellBy10(unsigned int* cell, unsigned int carry);
+// cell = (remainder * 2^32 + cell) / 10 for remainder < 10; returns the new remainder.
+DUDUZU_API unsigned int MintDivideOneCellBy10(unsigned int* cell, unsigned int remainder);
+
+// Printing by the main-output rule: "%u," per cell from the top down; and the
+// hexadecimal text of each Mint of a list, one per line.
+DUDUZU_API void MintPrint(FILE* f, unsigned int* m, int cells);
+DUDUZU_API void MintListPrint(FILE* f, DomList* list, int cells);
+// 1 if one of the first `count` elements of `list` (null ones skipped) equals m.
+DUDUZU_API int MintExistsInHeap(unsigned int* m, int cells, DomList* list, int count);
