@@ -1,6 +1,7 @@
 // Mint text forms: reading and writing in bases 2, 8, 10 and 16, the one-cell
 // decimal steps, printing, and the search in a list of Mints.
 #include <cctype>
+#include <cstdint>
 #include <cstring>
 
 #include "duduzu/list.h"
@@ -22,6 +23,7 @@ constexpr int kDecimalSignificantLimit = 3011;
 constexpr int kDecimalBinRoom = 10004;
 
 const char kDigits[] = "0123456789ABCDEF";
+constexpr uint64_t kChunk = 1000000000;  // nine decimal digits
 
 bool isLetter(char c, char upper) { return c == upper || c == upper + ('a' - 'A'); }
 
@@ -120,18 +122,24 @@ int writePowerOfTwo(const unsigned int* m, int cells, int bits, char* out) {
   return groups;
 }
 
-// Decimal digits by repeated long division of a copy by 10; -1 when the copy
-// cannot be made.
+// Decimal digits by repeated long division of a copy, by 10^9 so that each
+// pass over the cells yields nine digits; -1 when the copy cannot be made.
 int writeDecimal(unsigned int* m, int cells, char* out) {
   unsigned int* copy = MintCopy(m, cells);
   if (!copy) return -1;
   int top = cells - 1, n = 0;
   while (top >= 0 && copy[top] == 0) --top;
   do {
-    unsigned int remainder = 0;
-    for (int i = top; i >= 0; --i) remainder = MintDivideOneCellBy10(&copy[i], remainder);
-    out[n++] = static_cast<char>('0' + remainder);
+    uint64_t remainder = 0;
+    for (int i = top; i >= 0; --i) {
+      uint64_t dividend = remainder << 32 | copy[i];
+      copy[i] = static_cast<unsigned int>(dividend / kChunk);
+      remainder = dividend % kChunk;
+    }
     while (top >= 0 && copy[top] == 0) --top;
+    // Nine digits, least significant first; the last chunk without leading zeros.
+    for (int k = 0; k < 9 && (top >= 0 || remainder || n == 0); ++k, remainder /= 10)
+      out[n++] = static_cast<char>('0' + remainder % 10);
   } while (top >= 0);
   vzl_free(copy);
   for (int i = 0, j = n - 1; i < j; ++i, --j) {

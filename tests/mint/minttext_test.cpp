@@ -237,6 +237,12 @@ TEST(MintText, RoundTripsInEveryBaseAgainstGmp) {
   }
 }
 
+TEST(MintToStr, DecimalAroundNineDigitChunks) {
+  for (Cells m : {Cells{999999999u}, Cells{1000000000u}, Cells{0xA7640000u, 0x0DE0B6B3u},
+                  Cells{0xA763FFFFu, 0x0DE0B6B3u}, Cells{0xFFFFFFFFu, 0xFFFFFFFFu}, Cells{0, 1}, Cells{7, 0, 0}})
+    EXPECT_EQ(write(m, 0, 10, 0), gmpText(m, 10));
+}
+
 TEST(MintText, DecimalFromGmpText) {
   std::mt19937 rng(3);
   mpz_t z;
