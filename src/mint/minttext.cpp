@@ -92,8 +92,12 @@ unsigned int* mintOfBinary(const char* bin, int* cells) {
   *cells = length > 32 ? (length + 31) / 32 : 1;
   unsigned int* m = MintCreateNoInit(*cells);
   if (!m) return nullptr;
-  for (int bit = 0; bit < length; ++bit)
-    if (bin[length - 1 - bit] == '1') m[bit >> 5] |= 1u << (bit & 31);
+  // Cell c holds the (up to) 32 digits that end 32 * c digits before the end.
+  for (int c = 0, end = length; end > 0; ++c, end -= 32) {
+    unsigned int v = 0;
+    for (int k = end > 32 ? end - 32 : 0; k < end; ++k) v = v << 1 | (bin[k] == '1');
+    m[c] = v;
+  }
   return m;
 }
 
