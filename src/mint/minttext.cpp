@@ -1,5 +1,6 @@
 // Mint text forms: reading and writing in bases 2, 8, 10 and 16, the one-cell
 // decimal steps, printing, and the search in a list of Mints.
+#include <algorithm>
 #include <cctype>
 #include <cstdint>
 #include <cstring>
@@ -146,11 +147,7 @@ int writeDecimal(unsigned int* m, int cells, char* out) {
       out[n++] = static_cast<char>('0' + remainder % 10);
   } while (top >= 0);
   vzl_free(copy);
-  for (int i = 0, j = n - 1; i < j; ++i, --j) {
-    char c = out[i];
-    out[i] = out[j];
-    out[j] = c;
-  }
+  std::reverse(out, out + n);
   return n;
 }
 
