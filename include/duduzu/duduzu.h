@@ -5,6 +5,7 @@
 #include "duduzu/list.h"
 #include "duduzu/listset.h"
 #include "duduzu/listsort.h"
+#include "duduzu/mint.h"
 #include "duduzu/pool.h"
 #include "duduzu/qelmsg.h"
 #include "duduzu/session.h"

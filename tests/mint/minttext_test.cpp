@@ -1,0 +1,198 @@
+// Mint text forms: reading, writing, decimal steps, printing and list search.
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstdint>
+#include <random>
+#include <string>
+
+#include "duduzu/list.h"
+#include "duduzu/mint.h"
+#include "mint/mint_test_util.h"
+
+namespace {
+
+// MintFromStr as text: "-" for a refusal (outputs then untouched), else the
+// cell count and the hexadecimal value, e.g. "2:100000000".
+std::string read(const std::string& text, int base) {
+  unsigned int sentinel = 0, *m = &sentinel;
+  int cells = -7;
+  if (!MintFromStr(text.c_str(), &m, &cells, base)) {
+    EXPECT_TRUE(m == &sentinel && cells == -7) << text;
+    return "-";
+  }
+  Cells v = take(m, cells + 1);
+  EXPECT_EQ(v.back(), 0u) << text;  // the spare cell
+  v.pop_back();
+  return std::to_string(cells) + ":" + Mpz(v).text(16);
+}
+
+std::string write(Cells m, int width, int base, int prefix) {
+  std::string text(8 + 32 * m.size() + static_cast<size_t>(std::max(width, 0)), '#');
+  MintToStr(m.data(), static_cast<int>(m.size()), width, base, prefix, &text[0]);
+  return text.substr(0, text.find('\0'));
+}
+
+TEST(MintFromStr, FormsAcceptedAndRefused) {
+  for (const char* t : {"8'hFF", "'hff", "%HFF", "%hff", "FF", "16'HfF"}) EXPECT_EQ(read(t, 16), "1:FF") << t;
+  for (const char* t : {"%B101", "%b101", "4'b101", "'B101", "101"}) EXPECT_EQ(read(t, 2), "1:5") << t;
+  for (const char* t : {"%O17", "%o17", "17"}) EXPECT_EQ(read(t, 8), "1:F") << t;
+  for (const char* t : {"%D15", "%d15", "15"}) EXPECT_EQ(read(t, 10), "1:F") << t;
+  for (const char* t : {"%HF", "%hf", "%B1111", "%o17", "%D15", "15"}) EXPECT_EQ(read(t, 0), "1:F") << t;
+  EXPECT_EQ(read("000000001", 16), "2:1");
+  EXPECT_EQ(read("FFFFFFFF", 16), "1:FFFFFFFF");
+  EXPECT_EQ(read("4294967296", 10), "2:100000000");
+  EXPECT_EQ(read(std::string(32, '0') + "7", 10), "2:7");  // 33 characters, at least 33 bits
+  EXPECT_EQ(read("1" + std::string(32, '0'), 2), "2:100000000");
+  EXPECT_EQ(read("%b", 2) + read("", 2) + read("'h", 16) + read("%O", 8), "1:01:01:01:0");
+  const std::pair<const char*, int> refused[] = {
+      {"8'hFF", 0}, {"FF", 0}, {"%b", 0}, {"12x", 0}, {"", 0}, {"%Z12", 0}, {"x12", 0}, {"%D1x", 0},
+      {"8'hG", 16}, {"8h'F", 16}, {"x'hF", 16}, {"8'bF", 16}, {"%BFF", 16}, {"%", 16}, {"1 F", 16},
+      {"102", 2}, {"4'h1", 2}, {"a'b1", 2}, {"%X1", 2}, {"8'o17", 8}, {"18", 8}, {"1a", 10}, {"-1", 10},
+      {"%H8'hFF", 16}, {"'h1'hF", 16}, {"4'b1'b0", 2}, {"%b1'b1", 0},  // apostrophe among the digits
+      {"1", 1}, {"1", 3}, {"1", 9}, {"1", 17}, {"1", -2}};
+  for (const auto& [text, base] : refused) EXPECT_EQ(read(text, base), "-") << text << " " << base;
+}
+
+TEST(MintFromStr, BinaryFormLimitOf9999Digits) {
+  EXPECT_EQ(read(std::string(2499, 'F'), 16).substr(0, 4), "313:");
+  EXPECT_EQ(read(std::string(3333, '7'), 8).substr(0, 4), "313:");
+  EXPECT_EQ(read(std::string(9999, '0'), 10), "313:0");
+  for (const std::string& t : {std::string(2500, 'F'), "%H" + std::string(2500, '0'), std::string(3334, '7'),
+                               std::string(10000, '0'), std::string(20000, '9')})
+    EXPECT_EQ(read(t, t.size() == 3334 ? 8 : t.size() > 9999 ? 10 : 16), "-") << t.size();
+  Cells under(313, ~0u), over(313, 0);  // 2^9999 - 1 has 9999 bits and is read; 2^9999 has 10000
+  under.back() = 0x7FFFu;
+  over.back() = 0x8000u;
+  EXPECT_EQ(read(Mpz(under).text(10), 10), "313:7FFF" + std::string(2496, 'F'));
+  EXPECT_EQ(read(Mpz(over).text(10), 10), "-");
+  EXPECT_EQ(read(std::string(20000, '1'), 2).substr(0, 4), "625:");  // binary text is not widened
+}
+
+TEST(MintFromStr, MemoryFailures) {
+  PortTest::AllocFailureGuard guard;
+  PortTest::Capture cap;
+  PortTest::FailNthAlloc(1);  // the decimal converter's working copy: a silent refusal
+  EXPECT_EQ(read("12", 10), "-");
+  EXPECT_EQ(cap.size(), 0u);
+  unsigned int sentinel = 0, *m = &sentinel;
+  int cells = -7;
+  PortTest::FailAllAllocs();
+  EXPECT_EQ(MintFromStr("%HFF", &m, &cells, 0), 0);
+  EXPECT_TRUE(m == nullptr && cells == -7);
+  expectMemoryFull(cap, "MintCreateNoInit");
+}
+
+TEST(MintToStr, DigitsWidthAndPrefix) {
+  const Cells k255 = {255};
+  EXPECT_EQ(write(k255, 0, 16, 0) + write(k255, 0, 2, 0) + write(k255, 0, 8, 0), "FF11111111377");
+  EXPECT_EQ(write(k255, 0, 10, 0) + write(k255, 0, 0, 0), "255255");
+  EXPECT_EQ(write(k255, 4, 16, 1) + write(k255, 1, 10, 0) + write(k255, 2, 2, 1), "%H00FF2%B11");
+  EXPECT_EQ(write(k255, -3, 8, 1) + write(k255, 3, 8, 0), "%O377377");
+  EXPECT_EQ(write({0x80000000u}, 0, 8, 0), "20000000000");
+  EXPECT_EQ(write({0, 1}, 0, 8, 0), "40000000000");
+  EXPECT_EQ(write({0x40000000u, 1}, 0, 8, 0), "50000000000");  // a group across two cells
+  EXPECT_EQ(write({0, 0}, 0, 0, 1) + write({0, 0}, 0, 2, 0) + write({0}, 0, 8, 0) + write({}, 0, 16, 0), "%D0000");
+  EXPECT_EQ(write({}, 0, 10, 0) + write({0}, 3, 2, 0), "0000");
+  for (int base : {1, 3, 7, 32, -1}) EXPECT_EQ(write(k255, 4, base, 1), "") << base;
+  for (Cells m : {Cells{999999999u}, Cells{1000000000u}, Cells{0xA7640000u, 0x0DE0B6B3u},
+                  Cells{0xA763FFFFu, 0x0DE0B6B3u}, Cells{~0u, ~0u}, Cells{7, 0, 0}})
+    EXPECT_EQ(write(m, 0, 10, 0), Mpz(m).text(10));
+}
+
+TEST(MintToStr, DecimalCopyFailureWritesNoDigits) {
+  PortTest::AllocFailureGuard guard;
+  PortTest::Capture cap;
+  PortTest::FailNthAlloc(1);
+  EXPECT_EQ(write({1, 2}, 5, 10, 1), "");
+  expectMemoryFull(cap, "MintCopy");
+}
+
+TEST(MintText, RoundTripsInEveryBaseAgainstGmp) {
+  std::mt19937 rng(42);
+  for (int cells = 1; cells <= 40; ++cells) {
+    Cells m = randomCells(rng, cells);
+    if (cells % 5 == 0) m.back() = 0;        // a leading zero cell
+    if (cells % 7 == 0) m.back() &= 0x1FFu;  // a partial top cell
+    std::string hex = Mpz(m).text(16);
+    for (int base : {2, 8, 10, 16}) {
+      std::string text = write(m, 0, base, 0);
+      ASSERT_EQ(text, Mpz(m).text(base)) << base;
+      std::string padded = write(m, static_cast<int>(text.size()) + 9, base, 1);
+      EXPECT_EQ(padded.substr(11), text);
+      for (const std::string& t : {text, padded}) {
+        std::string value = read(t, t == text ? base : 0);
+        EXPECT_EQ(value.substr(value.find(':') + 1), hex) << t;
+      }
+    }
+    m.back() |= 0x80000000u;  // decimal text of exactly `cells` cells
+    EXPECT_EQ(read(Mpz(m).text(10), 10), std::to_string(cells) + ":" + Mpz(m).text(16));
+  }
+}
+
+TEST(MintDecimalSteps, AgainstWideArithmetic) {
+  std::mt19937 rng(9);
+  Cells samples = {0, 1, 9, 10, 0x7FFFFFFFu, 0x80000000u, ~0u, 0x19999999u};
+  for (int i = 0; i < 2000; ++i) samples.push_back(rng());
+  for (unsigned int v : samples) {
+    for (unsigned int carry : {0u, 9u, ~0u, static_cast<unsigned int>(rng())}) {
+      uint64_t wide = uint64_t{v} * 10 + carry;
+      unsigned int cell = v;
+      EXPECT_EQ(MintMultiplyOneCellBy10(&cell, carry), wide >> 32);
+      EXPECT_EQ(cell, static_cast<unsigned int>(wide));
+    }
+    for (unsigned int rem = 0; rem < 10; ++rem) {
+      uint64_t dividend = uint64_t{rem} << 32 | v;
+      unsigned int cell = v;
+      EXPECT_EQ(MintDivideOneCellBy10(&cell, rem), dividend % 10);
+      EXPECT_EQ(cell, dividend / 10);
+    }
+  }
+}
+
+TEST(MintPrint, CellsAndListsByTheMainOutputRule) {
+  unsigned int m[2] = {5, 1};
+  EXPECT_EQ(printed([&](FILE* f) { MintPrint(f, m, 2); }) + printed([&](FILE* f) { MintPrint(f, m, 0); }), "1,5,");
+  std::mt19937 rng(1);
+  Cells a = randomCells(rng, 200), b(200, 0);  // 1600 hexadecimal digits
+  a.back() |= 0x10000000u;
+  DomList* list = ListCreate();
+  ListAddElt(list, reinterpret_cast<int*>(a.data()));
+  ListAddElt(list, reinterpret_cast<int*>(b.data()));
+  std::string lines = Mpz(a).text(16) + "\n0\n";
+  EXPECT_EQ(printed([&](FILE* f) { MintListPrint(f, list, 200); }), lines);
+  PortTest::Capture cap;
+  EXPECT_EQ(printedToMainOutput([&] { MintPrint(MainEVarOutFile, m, 2); }, cap), 2u);
+  EXPECT_EQ(cap.text(), "1,5,");
+  cap.clear();
+  EXPECT_EQ(printedToMainOutput([&] { MintListPrint(MainEVarOutFile, list, 200); }, cap), 2u);
+  EXPECT_EQ(cap.text(), lines);
+  ListQuickDelete(&list);
+  EXPECT_EQ(printed([](FILE* f) { MintListPrint(f, nullptr, 1); }), "");
+}
+
+TEST(MintPrint, ListTextBufferFailureIsReported) {
+  unsigned int m[1] = {1};
+  DomList* list = ListCreate();
+  ListAddElt(list, reinterpret_cast<int*>(m));
+  PortTest::Capture cap;
+  PortTest::FailNthAlloc(1);
+  EXPECT_EQ(printed([&](FILE* f) { MintListPrint(f, list, 1); }), "");
+  PortTest::ResetAllocFailures();
+  expectMemoryFull(cap, "MintListPrint");
+  ListQuickDelete(&list);
+}
+
+TEST(MintExistsInHeap, SearchesTheFirstCountElements) {
+  unsigned int m[2] = {1, 2}, other[2] = {1, 3}, same[2] = {1, 2};
+  DomList* list = ListCreate();
+  for (unsigned int* e : {other, static_cast<unsigned int*>(nullptr), same}) ListAddElt(list, reinterpret_cast<int*>(e));
+  EXPECT_EQ(MintExistsInHeap(m, 2, list, 3), 1);
+  EXPECT_EQ(MintExistsInHeap(m, 2, list, 2), 0);  // null skipped, the third ignored
+  EXPECT_EQ(MintExistsInHeap(m, 1, list, 1), 1);  // only cell 0 compared
+  EXPECT_EQ(MintExistsInHeap(m, 0, list, 2), 1);
+  EXPECT_EQ(MintExistsInHeap(m, 2, list, 0), 0);
+  ListQuickDelete(&list);
+}
+
+}  // namespace
