@@ -6,3 +6,4 @@
 #include "duduzu/pool.h"
 #include "duduzu/session.h"
 #include "duduzu/str.h"
+#include "duduzu/system.h"
