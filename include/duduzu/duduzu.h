@@ -1,6 +1,7 @@
 // The whole public interface of libduduzu.
 #pragma once
 
+#include "duduzu/file.h"
 #include "duduzu/intutil.h"
 #include "duduzu/list.h"
 #include "duduzu/pool.h"
