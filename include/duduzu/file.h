@@ -49,3 +49,17 @@ DUDUZU_API void FileRemoveFile(const char* name);
 DUDUZU_API char* FileRemoveExtension(const char* name);
 DUDUZU_API char* FileGetDirName(char* name);
 DUDUZU_API char* FileGetFileExtension(char* name);
+
+// Temporary names. FileRandomNameNoExtension gives "p", four base-36 digits of
+// the process number and three of a name counter (names repeat after 46656).
+// The Tmp names are KERBTmpDir (which ends with its separator) followed by
+// such a name and ".extension" (none for a null extension), and are
+// registered for clean-up. No file is created.
+DUDUZU_API char* FileRandomNameNoExtension();
+DUDUZU_API char* FileCreateNameInTmpWithExtension(const char* extension);
+DUDUZU_API char* FileCreateRandomName();
+// Registers a copy of name for removal by FileRemoveAllFilesInTmp.
+DUDUZU_API void FileAddFileNameForCleanOnExit(char* name);
+// End-of-session clean-up: closes every tracked handle, removes every
+// registered file that exists, then KERBTmpDir's "kerb<process number>.ren".
+DUDUZU_API void FileRemoveAllFilesInTmp();
