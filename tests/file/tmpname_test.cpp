@@ -30,11 +30,6 @@ TEST(FileRandomName, ProcessFieldThenCounterField) {
   EXPECT_EQ(Owned(FileRandomNameNoExtension()), "p00rr000");  // wrapped
 }
 
-TEST(FileRandomName, ProcessNumber1000) {
-  Pid1000();
-  EXPECT_EQ(Owned(FileRandomNameNoExtension()), "p00rs000");
-}
-
 TEST(FileRandomName, WithoutMemory) {
   Pid999();
   PortTest::AllocFailureGuard guard;
@@ -150,7 +145,7 @@ TEST(FileRemoveAllFilesInTmp, ClosesOpenFilesBeforeRemovingThem) {
   KERBTmpDir = nullptr;
 }
 
-TEST(FileRemoveAllFilesInTmp, RenFileInALongDirectory) {
+TEST(FileRemoveAllFilesInTmp, ProcessNumber1000AndALongDirectory) {
   Pid1000();
   TempDir dir;
   std::string deep = dir.path;
@@ -160,6 +155,7 @@ TEST(FileRemoveAllFilesInTmp, RenFileInALongDirectory) {
   }
   ASSERT_GT(deep.size(), 360u);
   KERBTmpDir = deep.data();
+  EXPECT_EQ(Owned(FileRandomNameNoExtension()), "p00rs000");
   WriteFile(deep + "kerb1000.ren", "x");
   WriteFile(deep + "kerb999.ren", "x");
   FileRemoveAllFilesInTmp();
