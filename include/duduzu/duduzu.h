@@ -1,6 +1,7 @@
 // The whole public interface of libduduzu.
 #pragma once
 
+#include "duduzu/file.h"
 #include "duduzu/intutil.h"
 #include "duduzu/list.h"
 #include "duduzu/listset.h"
@@ -12,4 +13,5 @@
 #include "duduzu/str.h"
 #include "duduzu/strlist.h"
 #include "duduzu/strname.h"
+#include "duduzu/system.h"
 #include "duduzu/userobj.h"

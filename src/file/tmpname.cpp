@@ -1,0 +1,75 @@
+// Temporary names and the end-of-session clean-up.
+#include <cstring>
+
+#include "duduzu/file.h"
+#include "duduzu/list.h"
+#include "duduzu/str.h"
+#include "duduzu/system.h"
+#include "file/openfiles.h"
+#include "frame/unit.h"
+
+namespace {
+
+constexpr const char* kUnit = "../s/fileutil";
+
+unsigned nameCounter = 0;        // names made so far; never reset
+DomList* cleanList = nullptr;    // owned copies of the names to remove at the end
+
+// The w least significant base-36 digits of v ("0"-"9", "a"-"z"), most
+// significant first, zero-padded, in out (w + 1 bytes).
+void base36Field(unsigned v, int w, char* out) {
+  out[w] = '\0';
+  for (int i = w - 1; i >= 0; --i, v /= 36) out[i] = "0123456789abcdefghijklmnopqrstuvwxyz"[v % 36];
+}
+
+// KERBTmpDir, or the current directory (an empty prefix) when it is not set.
+const char* tmpDir() { return KERBTmpDir ? KERBTmpDir : ""; }
+
+}  // namespace
+
+char* FileRandomNameNoExtension() {
+  char* name = static_cast<char*>(vzl_calloc(255, 1));
+  if (!name) return nullptr;
+  char process[5], counter[4];
+  base36Field(static_cast<unsigned>(SystemGetPID()), 4, process);
+  base36Field(nameCounter++, 3, counter);
+  snprintf(name, 255, "p%s%s", process, counter);
+  return name;
+}
+
+char* FileCreateNameInTmpWithExtension(const char* extension) {
+  char* name = FileRandomNameNoExtension();
+  char* path = StrCopy(tmpDir());
+  StrSafeCatPX(&path, name);
+  if (extension) {
+    StrSafeCatPX(&path, ".");
+    StrSafeCatPX(&path, extension);
+  }
+  StrFree(&name);
+  FileAddFileNameForCleanOnExit(path);
+  return path;
+}
+
+char* FileCreateRandomName() { return FileCreateNameInTmpWithExtension("tmp"); }
+
+void FileAddFileNameForCleanOnExit(char* name) {
+  if (!name) return;
+  if (!cleanList) cleanList = ListCreate();
+  if (cleanList) ListAddElt(cleanList, reinterpret_cast<int*>(StrCopy(name)));
+}
+
+void FileRemoveAllFilesInTmp() {
+  FileCloseAllTracked();  // open files can be removed only once closed
+  for (int i = 0; cleanList && i < cleanList->count; ++i)
+    FileRemoveFile(reinterpret_cast<char*>(cleanList->elements[i]));
+  ListDelete(&cleanList, ListElemFree);
+  // Sized to fit whatever the directory's length.
+  const char* format = "%skerb%d.ren";
+  int pid = SystemGetPID();
+  size_t size = static_cast<size_t>(snprintf(nullptr, 0, format, tmpDir(), pid)) + 1;
+  char* ren = static_cast<char*>(vzl_malloc(size));
+  if (!ren) return;
+  snprintf(ren, size, format, tmpDir(), pid);
+  FileRemoveFile(ren);
+  vzl_free(ren);
+}
