@@ -34,4 +34,4 @@ DUDUZU_API extern jmp_buf RestartSession;
 
 // Stores code (6 when code is 0) in MainEVarReturnStatus and long-jumps to
 // RestartSession. Releases nothing on the way.
-DUDUZU_API [[noreturn]] void ExitToSession(int code);
+[[noreturn]] DUDUZU_API void ExitToSession(int code);

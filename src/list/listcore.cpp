@@ -97,7 +97,10 @@ DomList* ListCreateWithSize(int size) {
   }
   list->capacity = size > 0 ? size : 1;
   list->count = 0;
-  list->elements = static_cast<int**>(vzl_calloc(list->capacity, sizeof(int*)));
+  // Zero-filled array; malloc + memset is markedly faster than calloc for the
+  // small arrays most lists start with.
+  list->elements = static_cast<int**>(vzl_malloc(sizeof(int*) * static_cast<size_t>(list->capacity)));
+  if (list->elements) memset(list->elements, 0, sizeof(int*) * static_cast<size_t>(list->capacity));
   if (!list->elements) {
     DZ_REPORT(Fatal, "Data corruption (ListCreateWithSize) - Memory Full\n");
     PoolReleaseElt(recordPool, reinterpret_cast<char*>(list));
