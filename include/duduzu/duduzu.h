@@ -3,6 +3,7 @@
 
 #include "duduzu/intutil.h"
 #include "duduzu/list.h"
+#include "duduzu/param.h"
 #include "duduzu/pool.h"
 #include "duduzu/session.h"
 #include "duduzu/str.h"
