@@ -92,24 +92,29 @@ int ParamPosition(DomList* list, const char* name) {
                           });
 }
 
-// Text that does not fit a field is refused rather than cut, so that a record
-// never holds a silently altered name or value.
-DomParam* ParamCreateParam(const char* name, const char* value) {
+bool ParamFits(const char* name, const char* value) {
   size_t nameLen = name ? strlen(name) : 0, valueLen = value ? strlen(value) : 0;
   if (nameLen > kNameMax) {
     DZ_REPORT(Error, "Parameter name too long (%d characters, at most 254) : %s\n",
               static_cast<int>(nameLen), name);
-    return nullptr;
+    return false;
   }
   if (valueLen > kValueMax) {
     DZ_REPORT(Error, "Parameter value too long (%d characters, at most 1019) for %s\n",
               static_cast<int>(valueLen), orEmpty(name));
-    return nullptr;
+    return false;
   }
+  return true;
+}
+
+// Text that does not fit a field is refused rather than cut, so that a record
+// never holds a silently altered name or value.
+DomParam* ParamCreateParam(const char* name, const char* value) {
+  if (!ParamFits(name, value)) return nullptr;
   DomParam* p = newRecord();
   if (!p) return nullptr;
-  if (name) memcpy(p->CharParamQual, name, nameLen);
-  if (value) memcpy(p->CharParam, value, valueLen);
+  if (name) strcpy(p->CharParamQual, name);
+  if (value) strcpy(p->CharParam, value);
   return p;
 }
 
