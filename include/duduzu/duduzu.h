@@ -7,3 +7,5 @@
 #include "duduzu/pool.h"
 #include "duduzu/session.h"
 #include "duduzu/str.h"
+#include "duduzu/strlist.h"
+#include "duduzu/strname.h"
