@@ -43,6 +43,9 @@ DUDUZU_API int ParamCheckParamYesNo(DomList* list, const char* name, int default
 DUDUZU_API void ParamRemoveExistingParam(DomList* list, const char* name);
 DUDUZU_API void ParamRemoveExistingParamIfValue(DomList* list, char* name, char* value);
 DUDUZU_API void ParamChangeParamValue(DomList* list, const char* name, const char* value);
+// Substitutes $NAME environment references in every value; returns the
+// number of records changed.
+DUDUZU_API int ParamExpandEnvVar(DomList* list);
 DUDUZU_API void ParamMoveParamName(DomList* list, const char* oldName, const char* newName);
 DUDUZU_API void ParamMoveParamValue(DomList* list, const char* name, const char* oldValue,
                                     const char* newValue);

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "duduzu/str.h"
+#include "duduzu/strname.h"
 #include "frame/unit.h"
 #include "param/paramlist.h"
 
@@ -227,6 +228,19 @@ void ParamChangeParamValue(DomList* list, const char* name, const char* value) {
     return;
   }
   if (DomParam* p = ParamCreateParam(name, value)) append(list, p);
+}
+
+// Each substituted value replaces the value of the record it came from, even
+// when an earlier record has the same name.
+int ParamExpandEnvVar(DomList* list) {
+  int changed = 0;
+  for (int i = 1; list && i <= list->count; ++i) {
+    DomParam* p = ParamAt(list, i);
+    char* text = StrReplaceEnvVariable(p->CharParam);
+    if (text && replaceAt(list, i, p->CharParamQual, text)) ++changed;
+    StrFree(&text);
+  }
+  return changed;
 }
 
 void ParamMoveParamName(DomList* list, const char* oldName, const char* newName) {

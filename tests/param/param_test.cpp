@@ -262,3 +262,22 @@ TEST(ParamPrint, BothFormats) {
   DeleteList(&empty);
   DeleteList(&list);
 }
+
+TEST(ParamChange, ExpandEnvVar) {
+  setenv("DUDUZU_PARAM_DIR", "/h", 1);
+  unsetenv("DUDUZU_PARAM_UNSET");
+  DomList* list = MakeList({{"a", "x"}, {"b", "$DUDUZU_PARAM_UNSET/y"}, {"A", "$DUDUZU_PARAM_DIR/z"}});
+  EXPECT_EQ(ParamExpandEnvVar(list), 1);
+  // The expanded record keeps its place, and the earlier record of the same name is untouched.
+  EXPECT_EQ(Show(list), "a=x;b=$DUDUZU_PARAM_UNSET/y;A=/h/z");
+  EXPECT_EQ(ParamExpandEnvVar(list), 0);
+  EXPECT_EQ(ParamExpandEnvVar(nullptr), 0);
+  setenv("DUDUZU_PARAM_DIR", std::string(1020, 'd').c_str(), 1);
+  DomList* longer = MakeList({{"a", "$DUDUZU_PARAM_DIR"}});
+  PortTest::Capture cap;
+  EXPECT_EQ(ParamExpandEnvVar(longer), 0);  // too long for the field: kept as it was
+  EXPECT_EQ(cap.size(), 1u);
+  EXPECT_EQ(Show(longer), "a=$DUDUZU_PARAM_DIR");
+  DeleteList(&longer);
+  DeleteList(&list);
+}
