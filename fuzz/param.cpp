@@ -1,6 +1,7 @@
 // Feeds arbitrary parameter and descriptor strings to the command checks.
 // The input is split at NUL bytes into the parameters, the two descriptors
-// and a second parameter string compared with the parsed list.
+// and a second parameter string compared with the parsed list, whose values
+// then go through environment substitution.
 #include <cstddef>
 #include <cstdint>
 #include <string>
@@ -26,6 +27,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
   ParamCheckParamList(command, &parts[0][0], &parts[1][0], &parts[2][0], &list);
   ParamTopCheckParamList(list, &parts[3][0]);
   ParamTopCheckParamList(list, &parts[0][0]);
+  ParamExpandEnvVar(list);
   ListDelete(&list, FreeSlot);
   return 0;
 }

@@ -16,9 +16,9 @@ constexpr const char* kUnit = "../s/paramutl";
 constexpr size_t kNameMax = sizeof(DomParam::CharParamQual) - 1;
 constexpr size_t kValueMax = sizeof(DomParam::CharParam) - 1;
 
-DomParam* newRecord() {
+DomParam* newRecord(const char* function) {
   auto* p = static_cast<DomParam*>(vzl_calloc(1, sizeof(DomParam)));
-  if (!p) DZ_REPORT(Error, "Memory Full (%s)\n", "ParamCreateParam");
+  if (!p) DZ_REPORT(Error, "Memory Full (%s)\n", function);
   return p;
 }
 
@@ -112,7 +112,7 @@ bool ParamFits(const char* name, const char* value) {
 // never holds a silently altered name or value.
 DomParam* ParamCreateParam(const char* name, const char* value) {
   if (!ParamFits(name, value)) return nullptr;
-  DomParam* p = newRecord();
+  DomParam* p = newRecord("ParamCreateParam");
   if (!p) return nullptr;
   if (name) strcpy(p->CharParamQual, name);
   if (value) strcpy(p->CharParam, value);
@@ -121,7 +121,7 @@ DomParam* ParamCreateParam(const char* name, const char* value) {
 
 DomParam* ParamCopy(DomParam* param) {
   if (!param) return nullptr;
-  DomParam* p = newRecord();
+  DomParam* p = newRecord("ParamCopy");
   if (p) *p = *param;
   return p;
 }

@@ -11,22 +11,20 @@
 #include "duduzu/param.h"
 #include "port/port_testing.h"
 
-inline void FreeParamSlot(int** slot) { ParamFree(reinterpret_cast<DomParam**>(slot)); }
+inline void DeleteList(DomList** list) {
+  ListDelete(list, [](int** slot) { ParamFree(reinterpret_cast<DomParam**>(slot)); });
+}
 
-// A parameter list owning records made from (name, value) pairs.
 inline DomList* MakeList(std::initializer_list<std::pair<const char*, const char*>> records) {
   DomList* list = ListCreate();
   for (auto& r : records) ListAddElt(list, reinterpret_cast<int*>(ParamCreateParam(r.first, r.second)));
   return list;
 }
 
-inline void DeleteList(DomList** list) { ListDelete(list, FreeParamSlot); }
-
-// The list as "name=value" items joined by ";"; "<null>" for no list.
+// "name=value" items joined by ";"; "<null>" for no list.
 inline std::string Show(DomList* list) {
-  if (!list) return "<null>";
-  std::string s;
-  for (int i = 0; i < list->count; ++i) {
+  std::string s = list ? "" : "<null>";
+  for (int i = 0; list && i < list->count; ++i) {
     auto* p = reinterpret_cast<DomParam*>(list->elements[i]);
     s += (i ? ";" : "") + std::string(p->CharParamQual) + "=" + p->CharParam;
   }
@@ -40,12 +38,14 @@ inline std::string Owned(char* s) {
   return r;
 }
 
-// The capture holds exactly one report of this level and text from the parameter unit.
-inline void ExpectOneReport(const PortTest::Capture& cap, Port_MsgLevel level,
-                            const std::string& text) {
-  ASSERT_EQ(cap.size(), 1u);
-  EXPECT_EQ(cap[0].level, level);
-  EXPECT_EQ(cap[0].text, text);
-  EXPECT_EQ(cap[0].unit, "../s/paramutl");
-  EXPECT_EQ(cap[0].module, "DuduzuRorez");
+// The reports since the last call as "level:text" (0 fatal, 1 warning, 2 status, 4 error), all
+// from the parameter unit.
+inline std::string Reports(PortTest::Capture& cap) {
+  std::string s;
+  for (size_t i = 0; i < cap.size(); ++i) {
+    EXPECT_EQ(cap[i].unit, "../s/paramutl");
+    s += std::to_string(static_cast<int>(cap[i].level)) + ":" + cap[i].text;
+  }
+  cap.clear();
+  return s;
 }

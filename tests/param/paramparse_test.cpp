@@ -6,183 +6,91 @@
 
 namespace {
 
-// The parameters as parsed by the check of a command that is never checked.
-std::string Parsed(const char* text, int* ok = nullptr) {
-  DomList* list = reinterpret_cast<DomList*>(1);
-  int r = ParamCheckParamList(const_cast<char*>("run"), const_cast<char*>(text), nullptr, nullptr, &list);
-  if (ok) *ok = r;
-  std::string s = Show(list);
+char* C(const char* s) { return const_cast<char*>(s); }
+
+// Outcome of a check and the list it left.
+std::string Check(const char* command, const char* params, const char* d1, const char* d2 = "") {
+  DomList* list = nullptr;
+  int r = ParamCheckParamList(C(command), C(params), C(d1), C(d2), &list);
+  std::string s = std::to_string(r) + " " + Show(list);
   DeleteList(&list);
   return s;
 }
 
-// Outcome of checking `params` against the descriptors; the parsed list is released.
-int Check(const char* params, const char* d1, const char* d2 = "") {
-  DomList* list = nullptr;
-  int r = ParamCheckParamList(const_cast<char*>("cmd"), const_cast<char*>(params), const_cast<char*>(d1),
-                              const_cast<char*>(d2), &list);
-  DeleteList(&list);
-  return r;
-}
-
 }  // namespace
 
-TEST(ParamWords, Extract) {
-  char text[] = "  top \t\"a b\" \"\" x\"y ";
+TEST(ParamWords, ThreeExtractors) {
+  char text[] = "  top \t\"a b\" \"\" x\"y \"abc";
   char* c = text;
-  EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), "top");
-  EXPECT_EQ(*c, ' ');
-  EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), "a b");
-  EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), "<null>");  // empty quoted word, consumed
-  EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), "x\"y");
-  EXPECT_EQ(ParamExtractWordFromStr(&c), nullptr);
+  for (const char* want : {"top", "a b", "<null>", "x\"y", "abc", "<null>"})
+    EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), want);
   EXPECT_EQ(c, text + sizeof(text) - 1);
   c = text;
-  EXPECT_EQ(Owned(ParamExtractWordFromStrWithQuote(&c)), "top");
-  EXPECT_EQ(Owned(ParamExtractWordFromStrWithQuote(&c)), "\"a b\"");
-  EXPECT_EQ(Owned(ParamExtractWordFromStrWithQuote(&c)), "\"\"");
-  char open[] = " \"abc";
-  c = open;
-  EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), "abc");
-  EXPECT_EQ(*c, '\0');
-  c = open;
-  EXPECT_EQ(Owned(ParamExtractWordFromStrWithQuote(&c)), "\"abc");
-  char* none = nullptr;
-  EXPECT_EQ(ParamExtractWordFromStr(&none), nullptr);
-}
-
-TEST(ParamWords, ExtractIntoBuffer) {
-  char text[] = " \"a b\"c \"open end";
-  char buffer[32];
+  for (const char* want : {"top", "\"a b\"", "\"\"", "x\"y", "\"abc", "<null>"})
+    EXPECT_EQ(Owned(ParamExtractWordFromStrWithQuote(&c)), want);
+  char buffer[16];
   char* word = buffer;
-  char* c = text;
-  EXPECT_EQ(ParamExtractWordFromStrQuote(&c, &word), 1);
-  EXPECT_STREQ(buffer, "\"a b\"");
+  c = text;
+  for (auto want : {std::make_pair(1, "top"), {1, "\"a b\""}, {1, "\"\""}, {1, "x\"y"}, {0, "\"abc"}, {0, ""}}) {
+    EXPECT_EQ(ParamExtractWordFromStrQuote(&c, &word), want.first);
+    EXPECT_STREQ(buffer, want.second);
+  }
   EXPECT_EQ(word, buffer);
-  EXPECT_EQ(ParamExtractWordFromStrQuote(&c, &word), 1);
-  EXPECT_STREQ(buffer, "c");
-  EXPECT_EQ(ParamExtractWordFromStrQuote(&c, &word), 0);
-  EXPECT_STREQ(buffer, "\"open end");
-  EXPECT_EQ(ParamExtractWordFromStrQuote(&c, &word), 0);
-  EXPECT_STREQ(buffer, "");
 }
 
-TEST(ParamWords, LongWordsAreCutAt999) {
-  for (bool quoted : {false, true}) {
-    std::string body(1500, 'w');
-    std::string text = quoted ? "\"" + body + "\" next" : body + " next";
-    char* c = &text[0];
-    PortTest::Capture cap;
-    char* word = ParamExtractWordFromStr(&c);
-    EXPECT_EQ(std::string(word), std::string(999, 'w'));
-    vzl_free(word);
-    ASSERT_EQ(cap.size(), 1u);
-    EXPECT_EQ(cap[0].level, Port_Warning);
-    EXPECT_EQ(cap[0].text, "Name truncation in StrSafeCatTX : \n");
-    EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), "next");  // the cut part is consumed
-  }
-  std::string text998(998, 'w');
-  char* c = &text998[0];
+TEST(ParamWords, LongWordsAreCutAt999WithTheWarning) {
   PortTest::Capture cap;
-  EXPECT_EQ(Owned(ParamExtractWordFromStrWithQuote(&c)).size(), 998u);
+  for (std::string text : {std::string(1500, 'w') + " next", "\"" + std::string(1500, 'w') + "\" next"}) {
+    char* c = &text[0];
+    EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), std::string(999, 'w'));
+    EXPECT_EQ(cap.text(Port_Warning), "Name truncation in StrSafeCatTX : \n");
+    EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), "next");  // the cut part is consumed
+    cap.clear();
+  }
+  std::string text(998, 'w');
+  char* c = &text[0];
+  EXPECT_EQ(Owned(ParamExtractWordFromStrWithQuote(&c)), text);
   EXPECT_EQ(cap.size(), 0u);
 }
 
-TEST(ParamParse, Grammar) {
-  int ok = 0;
-  EXPECT_EQ(Parsed("top -depth 3 -v -name \"a b\"", &ok), "=top;depth=3;v=;name=\"a b\"");
-  EXPECT_EQ(ok, 1);
-  EXPECT_EQ(Parsed("-n -5"), "n=;5=");
-  EXPECT_EQ(Parsed("a \"b c\" - x"), "=a;=\"b c\";=x");
-  EXPECT_EQ(Parsed(""), "<null>");
-  EXPECT_EQ(Parsed(" \t\n", &ok), "<null>");
-  EXPECT_EQ(ok, 1);
-  EXPECT_EQ(Parsed("-a 1 2", &ok), "<null>");
-  EXPECT_EQ(ok, 0);
-  EXPECT_EQ(Parsed("-a x top", &ok), "<null>");
-  EXPECT_EQ(ok, 0);
-  EXPECT_EQ(Parsed(nullptr, &ok), "<null>");
-  EXPECT_EQ(ok, 1);
+TEST(ParamParse, GrammarAndUncheckedCommands) {
+  EXPECT_EQ(Check("run", "top -depth 3 -v -name \"a b\"", ""), "1 =top;depth=3;v=;name=\"a b\"");
+  EXPECT_EQ(Check("Run", "-n -5", ""), "1 n=;5=");
+  EXPECT_EQ(Check("kerb", "a \"b c\" - x", "-a 1 2"), "1 =a;=\"b c\";=x");  // descriptors unread
+  EXPECT_EQ(Check("macro", " \t\n", "") + Check("ENV", nullptr, ""), "1 <null>1 <null>");
+  EXPECT_EQ(Check("run", "-a 1 2", "") + Check("run", "-a x top", ""), "0 <null>0 <null>");
+  PortTest::Capture cap;  // a name too long for its field fails the parse
+  EXPECT_EQ(Check("run", ("-" + std::string(255, 'n') + " 1").c_str(), ""), "0 <null>");
+  EXPECT_EQ(cap.size(), 1u);
 }
 
-TEST(ParamParse, OverlongNameFailsTheParse) {
-  std::string text = "-" + std::string(255, 'n') + " 1";
-  PortTest::Capture cap;
-  int ok = 1;
-  EXPECT_EQ(Parsed(text.c_str(), &ok), "<null>");
-  EXPECT_EQ(ok, 0);
-  ASSERT_EQ(cap.size(), 1u);
-  EXPECT_EQ(cap[0].level, Port_Error);
-  EXPECT_EQ(Parsed(("-" + std::string(254, 'n') + " 1").c_str(), &ok), std::string(254, 'n') + "=1");
-}
-
-TEST(ParamCheck, DescriptorTable) {
+TEST(ParamCheck, DescriptorAcceptance) {
   const char* d = "S -depth I -v";
-  EXPECT_EQ(Check("top -depth 3 -v", d), 1);
-  EXPECT_EQ(Check("-depth 3", d), 0);
-  EXPECT_EQ(Check("top extra", d), 0);
-  EXPECT_EQ(Check("top -depth x", d), 0);
-  EXPECT_EQ(Check("top -depth", d), 1);
-  EXPECT_EQ(Check("top -v 1", d), 0);
-  EXPECT_EQ(Check("top -v -v", d), 0);
-  EXPECT_EQ(Check("top -v -V", d), 1);
-  EXPECT_EQ(Check("top -depth -5", d), 1);  // an empty depth, then the undeclared option 5
-  EXPECT_EQ(Check("top", "S", "-depth I"), 1);
-  EXPECT_EQ(Check("top -depth 3", "S", "-DEPTH I"), 1);
-  EXPECT_EQ(Check("top -depth x", "S -depth Q"), 0);  // unknown type code
-}
-
-TEST(ParamCheck, UnknownOptionIsSkippedWithAWarning) {
+  EXPECT_EQ(Check("c", "top -depth 3 -v", d), "1 =top;depth=3;v=");
+  EXPECT_EQ(Check("c", "top -depth x", d), "0 =top;depth=x");  // the rejected list stays
+  std::string outcomes;
+  for (const char* params : {"-depth 3", "top extra", "top -depth", "top -v 1", "top -v -v", "top -v -V"})
+    outcomes += Check("c", params, d)[0];
+  EXPECT_EQ(outcomes, "001001");
+  EXPECT_EQ(Check("c", "top -depth 3", "S", "-DEPTH I")[0], '1');
+  EXPECT_EQ(Check("c", "top -depth x", "S -depth Q")[0], '0');
+  EXPECT_EQ(Check("c", "", "-v") + Check("c", "", "S -v") + Check("c", "", ""), "1 <null>0 <null>1 <null>");
+  EXPECT_EQ(Check("c", "x", "")[0] + std::string(1, Check("c", "top", "S", "-a 1 2")[0]), "00");
   PortTest::Capture cap;
-  DomList* list = nullptr;
-  EXPECT_EQ(ParamCheckParamList(const_cast<char*>("cmd"), const_cast<char*>("top -unknown 1"),
-                                const_cast<char*>("S -depth I -v"), const_cast<char*>(""), &list),
-            1);
-  ExpectOneReport(cap, Port_Warning, "skipping parameter : unknown\n");
-  EXPECT_EQ(Show(list), "=top;unknown=1");  // kept in the list
-  DeleteList(&list);
-}
-
-TEST(ParamCheck, EmptyStringsAndUncheckedCommands) {
-  EXPECT_EQ(Check("", "-v"), 1);
-  EXPECT_EQ(Check("", "S -v"), 0);
-  EXPECT_EQ(Check("", ""), 1);
-  EXPECT_EQ(Check("x", ""), 0);
-  EXPECT_EQ(Check("-x", "", ""), 0);
-  EXPECT_EQ(Check("top", "-v", "-a 1 2"), 0);  // malformed descriptor
-  for (const char* command : {"RUN", "Kerb", "macro", "ENV"}) {
-    DomList* list = nullptr;
-    EXPECT_EQ(ParamCheckParamList(const_cast<char*>(command), const_cast<char*>("a b -c"),
-                                  const_cast<char*>("-a 1 2"), nullptr, &list), 1);
-    EXPECT_EQ(Show(list), "=a;=b;c=");
-    DeleteList(&list);
-  }
-  DomList* list = nullptr;
-  EXPECT_EQ(ParamCheckParamList(const_cast<char*>("cmd"), const_cast<char*>("x y"), const_cast<char*>("-v"),
-                                const_cast<char*>(""), &list), 0);
-  EXPECT_EQ(Show(list), "=x;=y");  // a rejected list stays with the caller
-  DeleteList(&list);
+  EXPECT_EQ(Check("c", "top -unknown 1 -depth -5", d), "1 =top;unknown=1;depth=;5=");
+  EXPECT_EQ(Reports(cap), "1:skipping parameter : unknown\n1:skipping parameter : 5\n");
 }
 
 TEST(ParamTopCheck, ComparesWithAList) {
   DomList* list = MakeList({{"opt", "Fast"}, {"v", ""}});
   PortTest::Capture cap;
-  EXPECT_EQ(ParamTopCheckParamList(list, const_cast<char*>("-OPT fast")), 1);
-  EXPECT_EQ(ParamTopCheckParamList(list, const_cast<char*>("-v -opt FAST")), 1);
-  EXPECT_EQ(cap.size(), 0u);
-  EXPECT_EQ(ParamTopCheckParamList(list, const_cast<char*>("-opt slow")), 0);
-  ExpectOneReport(cap, Port_Status, "Illegal parameter value for opt\n");
-  cap.clear();
-  EXPECT_EQ(ParamTopCheckParamList(list, const_cast<char*>("-other 1 -opt slow")), 0);
-  ExpectOneReport(cap, Port_Status, "Illegal parameter value for opt\n");  // list order first
-  cap.clear();
-  EXPECT_EQ(ParamTopCheckParamList(list, const_cast<char*>("-opt fast -other 1")), 0);
-  ExpectOneReport(cap, Port_Status, "Illegal parameter value for other\n");
-  cap.clear();
-  EXPECT_EQ(ParamTopCheckParamList(list, const_cast<char*>("")), 0);
-  EXPECT_EQ(ParamTopCheckParamList(list, const_cast<char*>("-a 1 2")), 0);
-  EXPECT_EQ(cap.size(), 0u);
-  EXPECT_EQ(ParamTopCheckParamList(nullptr, const_cast<char*>("-a")), 0);
-  ExpectOneReport(cap, Port_Status, "Illegal parameter value for a\n");
+  EXPECT_EQ(ParamTopCheckParamList(list, C("-v -OPT fast")), 1);
+  EXPECT_EQ(ParamTopCheckParamList(list, C("")) + ParamTopCheckParamList(list, C("-a 1 2")), 0);
+  EXPECT_EQ(Reports(cap), "");
+  EXPECT_EQ(ParamTopCheckParamList(list, C("-other 1 -opt slow")), 0);  // the list's order first
+  EXPECT_EQ(ParamTopCheckParamList(list, C("-opt fast -other 1")), 0);
+  EXPECT_EQ(ParamTopCheckParamList(nullptr, C("-a")), 0);
+  EXPECT_EQ(Reports(cap), "2:Illegal parameter value for opt\n2:Illegal parameter value for other\n"
+                          "2:Illegal parameter value for a\n");
   DeleteList(&list);
 }
