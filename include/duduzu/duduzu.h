@@ -7,6 +7,7 @@
 #include "duduzu/listset.h"
 #include "duduzu/listsort.h"
 #include "duduzu/mint.h"
+#include "duduzu/param.h"
 #include "duduzu/pool.h"
 #include "duduzu/qelmsg.h"
 #include "duduzu/session.h"
