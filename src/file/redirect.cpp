@@ -40,9 +40,9 @@ void pop(DomList*& stack) {
   if (stack->count == 0) ListQuickDelete(&stack);
 }
 
-// Keeps the types that quiet mode hides (3, 2, 7, 1) off the console.
+// Keeps the types that quiet mode hides off the console.
 void filterConsole() {
-  for (int type : {3, 2, 7, 1}) msgStream->disableMsgType(Port::File::getCout(), type);
+  for (int type : kScreenFilteredTypes) msgStream->disableMsgType(Port::File::getCout(), type);
 }
 
 }  // namespace

@@ -11,6 +11,9 @@ struct QelMsgHandOver {
 
 extern QelMsgHandOver qelMsgHandOver;
 
+// The message types quiet mode keeps off the console, in switching order.
+constexpr int kScreenFilteredTypes[] = {3, 2, 7, 1};
+
 // Internal setters, called by the message-manager set-up alone.
 void SetQelMsgQuiet(bool quiet);
 void SetQelMsgStream(Port_MsgStream* stream);

@@ -14,6 +14,10 @@ namespace dz {
 
 enum class Level { Status, Warning, Error, Fatal };
 
+// Origin of every report: the library's module name and revision text.
+constexpr const char* kModule = "DuduzuRorez";
+constexpr const char* kRevision = "$Revision: 1.1 $";
+
 #pragma GCC diagnostic push
 #pragma GCC diagnostic ignored "-Wformat-security"
 #pragma GCC diagnostic ignored "-Wformat-nonliteral"
@@ -23,7 +27,7 @@ enum class Level { Status, Warning, Error, Fatal };
 template <class... A>
 void report(const char* unit, int line, Level level, const char* fmt, A... args) {
   Port_MsgManData* r =
-      Port_MsgManData::createObject("DuduzuRorez", unit, line, "$Revision: 1.1 $");
+      Port_MsgManData::createObject(kModule, unit, line, kRevision);
   switch (level) {
     case Level::Status: r->issueStatus(fmt, args...); break;
     case Level::Warning: r->issueWarning(fmt, args...); break;

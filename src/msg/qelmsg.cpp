@@ -11,12 +11,9 @@
 namespace {
 
 constexpr const char* kUnit = "../s/qelmsg";
-constexpr const char* kModule = "DuduzuRorez";
-constexpr const char* kRevision = "$Revision: 1.1 $";
 
 // The types quiet mode keeps off the console, then all the others, each in
 // the order they are switched.
-constexpr int kScreenTypes[] = {3, 2, 7, 1};
 constexpr int kOtherTypes[] = {6, 5, 0, 4, 8};
 constexpr int kQuietShutTypes[] = {3, 2};
 
@@ -38,7 +35,7 @@ void switchTypes(bool on, Port::Stream* output, const int (&types)[N]) {
 
 // The console's types, leaving the screen-filtered ones to quiet mode.
 void switchConsole(bool on) {
-  if (!qelMsgHandOver.quiet) switchTypes(on, Port::File::getCout(), kScreenTypes);
+  if (!qelMsgHandOver.quiet) switchTypes(on, Port::File::getCout(), kScreenFilteredTypes);
   switchTypes(on, Port::File::getCout(), kOtherTypes);
 }
 
@@ -46,7 +43,7 @@ void setMessages(bool on) {
   if (!qelMsgHandOver.stream || messagesEnabled == on) return;
   messagesEnabled = on;
   switchConsole(on);
-  switchTypes(on, qelMsgHandOver.logStream, kScreenTypes);
+  switchTypes(on, qelMsgHandOver.logStream, kScreenFilteredTypes);
   switchTypes(on, qelMsgHandOver.logStream, kOtherTypes);
 }
 
@@ -67,7 +64,7 @@ void setQuietScreen(bool open, const int (&types)[N]) {
 void streamStatus(bool when, int line, const char* fmt, va_list ap) {
   Port_MsgStream* stream = qelMsgHandOver.stream;
   if (stream && messagesEnabled && when)
-    stream->issueStatusV(kModule, kUnit, line, kRevision, fmt, ap);
+    stream->issueStatusV(dz::kModule, kUnit, line, dz::kRevision, fmt, ap);
 }
 
 }  // namespace
@@ -92,7 +89,7 @@ void Qel_Msg::DisableScreen() { setScreen(false); }
 void Qel_Msg::EnableScreen() { setScreen(true); }
 
 void Qel_Msg::QuietDisableScreen() { setQuietScreen(false, kQuietShutTypes); }
-void Qel_Msg::QuietEnableScreen() { setQuietScreen(true, kScreenTypes); }
+void Qel_Msg::QuietEnableScreen() { setQuietScreen(true, kScreenFilteredTypes); }
 
 bool Qel_Msg::IsQuietEnableScreen() { return qelMsgHandOver.quiet && quietScreen; }
 
@@ -104,7 +101,7 @@ void Qel_Msg::WarnOnce(const char* fmt, ...) {
   if (!warned.insert(fmt).second) return;
   va_list ap;
   va_start(ap, fmt);
-  stream->issueWarningV(kModule, kUnit, __LINE__, kRevision, fmt, ap);
+  stream->issueWarningV(dz::kModule, kUnit, __LINE__, dz::kRevision, fmt, ap);
   va_end(ap);
   DZ_REPORT(Status, "Last warning will be issued only once.\n");
 }
