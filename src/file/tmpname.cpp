@@ -10,8 +10,6 @@
 
 namespace {
 
-constexpr const char* kUnit = "../s/fileutil";
-
 unsigned nameCounter = 0;        // names made so far; never reset
 DomList* cleanList = nullptr;    // owned copies of the names to remove at the end
 

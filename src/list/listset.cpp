@@ -9,8 +9,6 @@
 
 namespace {
 
-constexpr const char* kUnit = "../s/listutil";
-
 int countOf(const DomList* list) { return list ? list->count : 0; }
 
 auto memberBy(ListEqualFn equal) {

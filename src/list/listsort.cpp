@@ -10,8 +10,6 @@
 
 namespace {
 
-constexpr const char* kUnit = "../s/listutil";
-
 int countOf(const DomList* list) { return list ? list->count : 0; }
 
 void moveSlots(int** to, int** from, int n) { memmove(to, from, sizeof(int*) * static_cast<size_t>(n)); }

@@ -8,8 +8,6 @@
 
 namespace {
 
-[[maybe_unused]] constexpr const char* kUnit = "../s/strutil";  // nothing here reports
-
 // Start of the file part: just behind the last backslash, or else the last slash.
 const char* filePart(const char* name) {
   const char* slash = StrChrSlash(name);
