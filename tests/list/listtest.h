@@ -16,6 +16,7 @@
 
 using Vals = std::vector<long>;
 using Calls = std::vector<std::pair<long, long>>;
+using Ints = std::vector<int>;  // several results compared at once
 
 inline int* P(long v) { return reinterpret_cast<int*>(static_cast<intptr_t>(v)); }
 inline long V(const int* p) { return static_cast<long>(reinterpret_cast<intptr_t>(p)); }
@@ -38,6 +39,9 @@ inline Vals Of(const DomList* list) {
 }
 // The values of a new list (null: none), which is then released.
 inline Vals Take(DomList* list) { return Of(Owned(list).get()); }
+// The values and the capacity of a list.
+using Shape = std::pair<Vals, int>;
+inline Shape ShapeOf(const DomList* list) { return {Of(list), list->capacity}; }
 
 // Exactly these reports, each of `level` and of the list unit.
 inline void ExpectReports(const PortTest::Capture& cap, Port_MsgLevel level,

@@ -5,25 +5,21 @@
 #include <set>
 
 #include "listtest.h"
-#include "support/session_test.h"
 
 namespace {
 
 int CtxEq(int* x, int* v, int*) { return Eq(x, v); }
 int* Plus100(int* e) { return P(V(e) + 100); }
-int* CtxPlus100(int* e, int* context) {
-  lastContext = context;
-  return Plus100(e);
-}
+int* CtxPlus100(int* e, int* context) { return lastContext = context, Plus100(e); }
 bool Has(const Vals& v, long x) { return std::find(v.begin(), v.end(), x) != v.end(); }
 
 TEST(ListSetOps, AgreeWithReferencesOnRandomLists) {
   std::mt19937 rng(4);
   for (int round = 0; round < 200; ++round) {
-    long range = 1 + rng() % 60;  // values 1 to range; b often equals a as a set or multiset
+    long range = 1 + rng() % 60;  // b often equals a as a set or as a multiset
     auto values = [&] {
-      Vals v = Keyed(rng, 120, range);
-      for (long& x : v) x /= 1000;
+      Vals v(rng() % 121);
+      for (long& x : v) x = 1 + static_cast<long>(rng() % range);
       return v;
     };
     Vals a = values(), b = a;
@@ -48,18 +44,14 @@ TEST(ListSetOps, AgreeWithReferencesOnRandomLists) {
 
     Owned la = Make(a), lb = Make(b), into = Make(a), dedup = Make(a);
     EXPECT_EQ(ListIdentical(la.get(), lb.get(), Eq), sa == sb);
-    EXPECT_EQ(ListContextualIdentical(la.get(), lb.get(), CtxEq, nullptr), sa == sb);
-    EXPECT_EQ(ListIncludeInList(la.get(), lb.get(), Eq),
-              std::includes(sa.begin(), sa.end(), sb.begin(), sb.end()));
+    EXPECT_EQ(ListIncludeInList(la.get(), lb.get(), Eq), std::includes(sa.begin(), sa.end(), sb.begin(), sb.end()));
     EXPECT_EQ(ListIdenticalQuick(la.get(), Make(b).get(), Eq, 0), ma == mb);
     EXPECT_EQ(Take(ListIntersectionNoEltCr(la.get(), lb.get(), Eq)), inter);
     EXPECT_EQ(Take(ListUnionNoEltCr(la.get(), lb.get(), Eq)), uni);
     EXPECT_EQ(Take(ListComplement(la.get(), lb.get(), Eq)), comp);
-    EXPECT_EQ(Take(ListContextualComplement(la.get(), lb.get(), CtxEq, nullptr)), comp);
     DomList* raw = into.get();
     ListUnionNoEltCrNoLCr(&raw, lb.get(), Eq);
     EXPECT_EQ(Of(into.get()), grown);
-    EXPECT_EQ(ListCheckNoDuplication(la.get(), Eq), unique);
     EXPECT_EQ(ListContextualCheckNoDuplication(la.get(), CtxEq, nullptr), unique);
     EXPECT_EQ(ListSortedCheckNoDuplication(Make(ma).get(), Eq), unique);
     EXPECT_EQ(ListSearchDuplication(la.get(), Eq), unique ? 0 : static_cast<int>(dup) + 1);
@@ -77,17 +69,17 @@ TEST(ListSetOps, AgreeWithReferencesOnRandomLists) {
 
 TEST(ListSetOps, EmptyListsAndCallbackArgumentOrder) {
   Owned empty = Make({}), x = Make({7});
-  EXPECT_EQ(ListIdentical(nullptr, empty.get(), Eq) + ListIncludeInList(nullptr, empty.get(), Eq), 2);
-  EXPECT_EQ(ListContextualIdentical(empty.get(), nullptr, CtxEq, nullptr), 1);
-  EXPECT_EQ(ListIdentical(x.get(), nullptr, Eq) + ListIncludeInList(nullptr, x.get(), Eq), 0);
-  EXPECT_EQ(ListCheckNoDuplication(nullptr, Eq) + ListSortedCheckNoDuplication(nullptr, Eq), 2);
+  EXPECT_EQ((Ints{ListIdentical(nullptr, empty.get(), Eq), ListContextualIdentical(empty.get(), nullptr, CtxEq, nullptr),
+                  ListIdentical(x.get(), nullptr, Eq), ListIncludeInList(nullptr, empty.get(), Eq),
+                  ListIncludeInList(nullptr, x.get(), Eq), ListCheckNoDuplication(nullptr, Eq),
+                  ListSortedCheckNoDuplication(nullptr, Eq)}),
+            (Ints{1, 1, 0, 1, 0, 1, 1}));
   int context;
   Owned a = Make({1, 2}), b = Make({2, 1});
   EXPECT_EQ(Recorded([&] { ListContextualIdentical(a.get(), b.get(), CtxEqRec, &context); }),
             (Calls{{2, 1}, {1, 1}, {2, 2}, {1, 2}, {2, 2}, {1, 1}}));
   EXPECT_EQ(lastContext, &context);
-  EXPECT_EQ(Recorded([&] { ListIncludeInList(Make({5, 6}).get(), Make({6}).get(), EqRec); }),
-            (Calls{{5, 6}, {6, 6}}));
+  EXPECT_EQ(Recorded([&] { ListIncludeInList(Make({5, 6}).get(), Make({6}).get(), EqRec); }), (Calls{{5, 6}, {6, 6}}));
   a = Make({1, 3, 2}), b = Make({2, 1, 4});  // stops at 3, b consumed so far
   EXPECT_EQ(Recorded([&] { EXPECT_EQ(ListIdenticalQuick(a.get(), b.get(), EqRec, 0), 0); }),
             (Calls{{2, 1}, {1, 1}, {2, 3}, {4, 3}}));
@@ -101,12 +93,10 @@ int HeapEq(int* x, int* v) { return *x == *v; }
 
 TEST(ListSetOps, SingleElementsAndReleaseOfDuplicates) {
   Owned list = Make({1, 2, 1});
-  EXPECT_EQ(ListRemoveElt(list.get(), P(1), Eq), 1);
-  EXPECT_EQ(ListRemoveElt(list.get(), P(5), Eq), 0);
+  EXPECT_EQ(ListRemoveElt(list.get(), P(1), Eq) * 10 + ListRemoveElt(list.get(), P(5), Eq), 10);
   ListAddEltNoDupl(list.get(), P(2), Eq);
   ListAddEltNoDupl(list.get(), P(4), Eq);
   EXPECT_EQ(Of(list.get()), (Vals{2, 1, 4}));
-
   DomList* heap = ListCreate();  // ASan reports a leaked or twice-freed element
   for (int v : {4, 5, 4, 4, 5, 6}) {
     ListAddElt(heap, static_cast<int*>(vzl_malloc(sizeof(int))));
@@ -127,21 +117,15 @@ TEST(ListSetOps, NullEmptyResultsCapacitiesAndCopies) {
                         ListInverseNoEltCr(empty.get()), ListComplement(nullptr, empty.get(), Eq)})
     EXPECT_EQ(none, nullptr);
   for (DomList* c : {ListComplement(x.get(), x.get(), Eq), ListComplement(nullptr, x.get(), Eq),
-                     ListContextualComplement(nullptr, nullptr, CtxEq, nullptr)}) {
-    EXPECT_EQ(c->count * 100 + c->capacity, 16);  // empty, of capacity 16
-    ListQuickDelete(&c);
-  }
-  Owned r(ListComplement(x.get(), empty.get(), Eq));  // a copy of a, sized to it
-  EXPECT_EQ(r->capacity, 1);
-  r.reset(ListUnionNoEltCr(x.get(), yy.get(), Eq));
-  EXPECT_EQ(Of(r.get()), (Vals{1, 2, 2}));
-  EXPECT_EQ(r->capacity, 4);  // the copy of a (capacity 1) doubled twice
+                     ListContextualComplement(nullptr, nullptr, CtxEq, nullptr)})
+    EXPECT_EQ(ShapeOf(Owned(c).get()), Shape({}, 16));
+  EXPECT_EQ(ShapeOf(Owned(ListComplement(x.get(), empty.get(), Eq)).get()), Shape({1}, 1));  // a copy of a
+  EXPECT_EQ(ShapeOf(Owned(ListUnionNoEltCr(x.get(), yy.get(), Eq)).get()), Shape({1, 2, 2}, 4));
   EXPECT_EQ(Take(ListContextualUnionNoEltCr(nullptr, yy.get(), CtxEq, nullptr)), (Vals{2, 2}));
   DomList* grown = nullptr;
   ListUnionNoEltCrNoLCr(&grown, yy.get(), Eq);  // a null *a becomes a copy of b
   EXPECT_EQ(Take(grown), (Vals{2, 2}));
-
-  Owned a = Make({1, 2, 3}), b = Make({3, 1});
+  Owned a = Make({1, 2, 3}), b = Make({3, 1}), r;
   EXPECT_EQ(Take(ListUnion(a.get(), Make({4, 2}).get(), Eq, Plus100)), (Vals{101, 102, 103, 104}));
   int context;
   EXPECT_EQ(Recorded([&] {
@@ -149,21 +133,8 @@ TEST(ListSetOps, NullEmptyResultsCapacitiesAndCopies) {
             }),
             (Calls{{3, 1}, {1, 1}, {3, 2}, {1, 2}, {3, 3}}));
   EXPECT_EQ(lastContext, &context);
-  EXPECT_EQ(Of(r.get()), (Vals{101, 103}));
-  EXPECT_EQ(r->capacity, 2);
-  r.reset(ListInverseNoEltCr(a.get()));
-  EXPECT_EQ(Of(r.get()), (Vals{3, 2, 1}));
-  EXPECT_EQ(r->capacity, 16);
-}
-
-TEST(ListSetOps, GrowthFailureExitsToSession) {
-  Owned a = Make(Vals(17, 5)), b = Make({5});
-  PortTest::Capture cap;
-  PortTest::AllocFailureGuard guard;
-  PortTest::FailNthAlloc(2);  // the result's array is allocated, its growth fails
-  EXPECT_TRUE(ExitsToSession([&] { ListIntersectionNoEltCr(a.get(), b.get(), Eq); }));
-  EXPECT_EQ(MainEVarReturnStatus, 3);
-  ExpectReports(cap, Port_Fatal, {"Data corruption (ListAddElt) - Memory Full\n"});
+  EXPECT_EQ(ShapeOf(r.get()), Shape({101, 103}, 2));
+  EXPECT_EQ(ShapeOf(Owned(ListInverseNoEltCr(a.get())).get()), Shape({3, 2, 1}, 16));
 }
 
 int Value(int* e) { return static_cast<int>(V(e)); }
@@ -171,9 +142,9 @@ int CtxValue(int* e, int* context) { return Value(e) * *context; }
 
 TEST(ListSetOps, SumsExtremesAndPairs) {
   int three = 3;
-  EXPECT_EQ(ListEltSum(nullptr, Value), 0);
-  EXPECT_EQ(ListEltSum(Make({INT_MAX, 1, 2}).get(), Value), INT_MIN + 2);
-  EXPECT_EQ(ListContextualEltSum(Make({1, 2}).get(), CtxValue, &three), 9);
+  EXPECT_EQ((Ints{ListEltSum(nullptr, Value), ListEltSum(Make({INT_MAX, 1, 2}).get(), Value),
+                  ListContextualEltSum(Make({1, 2}).get(), CtxValue, &three)}),
+            (Ints{0, INT_MIN + 2, 9}));  // wrapping like 32-bit arithmetic
   Owned list = Make({3000, 7000, 7001, 1000});
   EXPECT_EQ(V(ListMaxMinElt(list.get(), 0, Cmp)), 7000);  // ties keep the earlier
   EXPECT_EQ(Recorded([&] { EXPECT_EQ(V(ListMaxMinElt(list.get(), 1, CmpRec)), 1000); }),
