@@ -41,6 +41,7 @@ TEST(ListSort, AgreesWithStdAlgorithmsOnRandomLists) {
       ref.insert(at, e);
       ASSERT_EQ(ListInsertInSortedList(sorted.get(), P(e), Cmp, ascending), pos);
     }
+    EXPECT_EQ(Of(sorted.get()), ref);
     Vals keys = {0, range + 1};  // absent, then present keys and their neighbours
     for (long e : v) keys.push_back(e / 1000 + e % 2);
     for (long key : keys) {
