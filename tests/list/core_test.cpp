@@ -94,8 +94,7 @@ TEST(ListCore, CopiesAndJoins) {
   EXPECT_EQ(ShapeOf(emptyCopy.get()), Shape({}, 1));
   EXPECT_EQ(Of(shared.get()), (Vals{1, 2, 3}));
   EXPECT_NE(shared->elements, src->elements);
-  EXPECT_EQ(ListCopy(nullptr, Double), nullptr);
-  EXPECT_EQ(ListCopyNoEltCr(nullptr), nullptr);
+  EXPECT_TRUE(ListCopy(nullptr, Double) == nullptr && ListCopyNoEltCr(nullptr) == nullptr);
   ListAdd(copy.get(), src.get(), Double);
   EXPECT_EQ(copy->capacity, 6);
   ListAddNoEltCr(src.get(), src.get());  // a list joined to itself
@@ -124,8 +123,7 @@ TEST(ListCore, DeleteFreesEverySlotInOrder) {
 
 TEST(ListCore, RecordReuseAndCreationFailures) {
   PortTest::AllocFailureGuard guard;
-  DomList* list = ListCreate();
-  DomList* first = list;
+  DomList *list = ListCreate(), *first = list;
   ListQuickDelete(&list);
   PortTest::Capture cap;
   PortTest::FailNthAlloc(1);  // the element array: the record goes back to the pool

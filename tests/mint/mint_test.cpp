@@ -16,10 +16,9 @@ TEST(MintStorage, BitsCreationAndCopies) {  // ASan catches a short allocation
   MintInvBitValue(m, 64);
   EXPECT_EQ(Cells(m, m + 2), (Cells{0x80000000u, 0x80000001u}));
   EXPECT_EQ(MintBitValue(m, 32) * 2 + MintBitValue(m, 31), 2);
-  EXPECT_EQ(take(MintCreateNoInit(2), 3), (Cells{0, 0, 0}));  // a spare cell
-  EXPECT_EQ(take(MintCreateInitValue(2, 7), 2), (Cells{7, 7}));
-  EXPECT_EQ(take(MintCreateInit0(1), 1), (Cells{0}));
-  EXPECT_EQ(take(MintCopy(src, 3), 3), (Cells{1, 2, 3}));
+  EXPECT_EQ((Mints{take(MintCreateNoInit(2), 3), take(MintCreateInitValue(2, 7), 2), take(MintCreateInit0(1), 1),
+                   take(MintCopy(src, 3), 3)}),
+            (Mints{{0, 0, 0}, {7, 7}, {0}, {1, 2, 3}}));  // MintCreateNoInit adds a spare cell
   EXPECT_EQ(MintCopyNoCr(src, dst, 0) + 10 * MintCopyNoCr(src, dst, 3) + 100 * MintCopyNoCr(Cells(3, 0).data(), dst, 2), 10);
   MintInitWithValue(dst, 1, 9);
   EXPECT_EQ(Cells(dst, dst + 3), (Cells{9, 0, 3}));
@@ -53,18 +52,18 @@ TEST(MintLogic, CellByCellWithTheResultAliasingAnOperand) {
       unsigned int results[6] = {~a[i], a[i] & b[i], a[i] | b[i], ~(a[i] | b[i]), a[i] ^ b[i], ~(a[i] ^ b[i])};
       for (int k = 0; k < 6; ++k) want[k].push_back(results[k]);
     }
-    EXPECT_EQ(MintNOTNoCreate(got[0].data(), got[0].data(), cells), 1);
-    EXPECT_EQ(MintANDNoCreate(got[1].data(), b.data(), got[1].data(), cells), 1);
-    EXPECT_EQ(MintORNoCreate(b.data(), got[2].data(), got[2].data(), cells), 1);
-    EXPECT_EQ(MintNORNoCreate(got[3].data(), b.data(), got[3].data(), cells), 1);
+    EXPECT_EQ((std::vector<int>{MintNOTNoCreate(got[0].data(), got[0].data(), cells),
+                                MintANDNoCreate(got[1].data(), b.data(), got[1].data(), cells),
+                                MintORNoCreate(b.data(), got[2].data(), got[2].data(), cells),
+                                MintNORNoCreate(got[3].data(), b.data(), got[3].data(), cells)}),
+              std::vector<int>(4, 1));  // some result cell is non-zero
     MintXORNoCreate(got[4].data(), b.data(), got[4].data(), cells);
     MintXNORNoCreate(b.data(), got[5].data(), got[5].data(), cells);
-    for (int k = 0; k < 6; ++k) EXPECT_EQ(got[k], want[k]) << k;
+    EXPECT_EQ(Mints(got, got + 6), Mints(want, want + 6));
     for (int k : {0, 1, 2, 5}) want[k].push_back(0);  // the created forms' spare cell
-    EXPECT_EQ(take(MintNOT(a.data(), cells), cells + 1), want[0]);
-    EXPECT_EQ(take(MintAND(a.data(), b.data(), cells), cells + 1), want[1]);
-    EXPECT_EQ(take(MintOR(a.data(), b.data(), cells), cells + 1), want[2]);
-    EXPECT_EQ(take(MintXNOR(a.data(), b.data(), cells), cells + 1), want[5]);
+    EXPECT_EQ((Mints{take(MintNOT(a.data(), cells), cells + 1), take(MintAND(a.data(), b.data(), cells), cells + 1),
+                     take(MintOR(a.data(), b.data(), cells), cells + 1), take(MintXNOR(a.data(), b.data(), cells), cells + 1)}),
+              (Mints{want[0], want[1], want[2], want[5]}));
   }
 }
 
@@ -98,8 +97,7 @@ TEST(MintArith, CarriesOfAddAndIncrement) {
   EXPECT_EQ(MintAddOneCell(&e, 0x7FFFFFFFu) * 2 + MintAddOneCell(&e, 0x80000001u), 1u);
   Cells full(2, ~0u), chain = {~0u, ~0u, 41, ~0u};
   EXPECT_EQ(MintIncrement(full.data(), 2) * 2 + MintIncrement(chain.data(), 4), 2u);
-  EXPECT_EQ((std::vector<Cells>{{c, d, e}, full, chain}),
-            (std::vector<Cells>{{0, ~0u, 0x80000000u}, {0, 0}, {0, 0, 42, ~0u}}));  // carries stop at 41
+  EXPECT_EQ((Mints{{c, d, e}, full, chain}), (Mints{{0, ~0u, 0x80000000u}, {0, 0}, {0, 0, 42, ~0u}}));  // carries stop at 41
 }
 
 TEST(MintPrintBits, StreamAndMainOutput) {

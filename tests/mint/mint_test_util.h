@@ -15,6 +15,7 @@
 #include "port/port_testing.h"
 
 using Cells = std::vector<unsigned int>;
+using Mints = std::vector<Cells>;  // several results compared at once
 
 // The first `cells` cells of a created Mint, which is then released.
 inline Cells take(unsigned int* m, int cells) {
