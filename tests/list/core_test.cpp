@@ -1,376 +1,187 @@
 // List core: growth, removal, search, compaction, copies, printing, failures.
-#include <gtest/gtest.h>
-
-#include <cstdint>
+#include <climits>
 #include <string>
-#include <vector>
+#include <tuple>
 
-#include "duduzu/duduzu.h"
-#include "port/port_testing.h"
+#include "listtest.h"
 #include "support/session_test.h"
 
 namespace {
 
-int* I(intptr_t v) { return reinterpret_cast<int*>(v); }
+Vals freed;
+void RecordFree(int** slot) { freed.push_back(V(*slot)), *slot = nullptr; }
 
-DomList* make(std::initializer_list<intptr_t> values) {
-  DomList* list = ListCreate();
-  for (intptr_t v : values) ListAddElt(list, I(v));
-  return list;
-}
-
-std::vector<intptr_t> items(const DomList* list) {
-  std::vector<intptr_t> out;
-  for (int i = 0; i < list->count; ++i) out.push_back(reinterpret_cast<intptr_t>(list->elements[i]));
-  return out;
-}
-
-using V = std::vector<intptr_t>;
-
-std::vector<int*> freed;
-void recordFree(int** slot) {
-  freed.push_back(*slot);
-  *slot = nullptr;
-}
-
-}  // namespace
-
-TEST(ListCore, CapacityStartsAtSizeAndOnlyDoubles) {
-  DomList* list = ListCreateWithSize(0);
-  EXPECT_EQ(list->capacity, 1);
-  EXPECT_EQ(list->elements[0], nullptr);
-  int seen[3];
-  for (int i = 0; i < 3; ++i) {
-    ListAddElt(list, I(i + 1));
-    seen[i] = list->capacity;
-  }
-  EXPECT_EQ(seen[0], 1);
-  EXPECT_EQ(seen[1], 2);
-  EXPECT_EQ(seen[2], 4);
-  ListQuickDelete(&list);
-  EXPECT_EQ(list, nullptr);
-
-  list = ListCreate();
-  EXPECT_EQ(list->capacity, 16);
-  for (int i = 0; i < 16; ++i) ListAddElt(list, I(i));
-  EXPECT_EQ(list->capacity, 16);
-  ListAddElt(list, I(16));
-  EXPECT_EQ(list->capacity, 32);
-  EXPECT_EQ(list->count, 17);
-  ListQuickDelete(&list);
-}
-
-TEST(ListCore, SetReallocGrowsPastTheIndexAndNullsTheGap) {
-  DomList* list = make({1, 2, 3});
-  ListSetRealloc(list, I(9), 40);
-  EXPECT_EQ(list->capacity, 64);
-  EXPECT_EQ(list->count, 41);
-  for (int i = 3; i < 40; ++i) EXPECT_EQ(list->elements[i], nullptr);
-  EXPECT_EQ(list->elements[40], I(9));
-  ListSetRealloc(list, I(7), 5);
-  EXPECT_EQ(list->count, 41);
-  EXPECT_EQ(list->elements[5], I(7));
-
+TEST(ListCore, GrowthOnlyDoublesAndSetReallocNullsTheGap) {
+  Owned tiny(ListCreateWithSize(0)), grown(ListCreate());
+  EXPECT_EQ((Ints{tiny->capacity, grown->capacity}), (Ints{1, 16}));
+  EXPECT_EQ(tiny->elements[0], nullptr);
+  for (int i = 1; i <= 3; ++i) ListAddElt(tiny.get(), P(i));
+  EXPECT_EQ(tiny->capacity, 4);  // 1, 2, 4
+  Vals want(41, 0);
+  for (int i = 0; i < 17; ++i) ListAddElt(grown.get(), P(want[i] = i + 1));
+  EXPECT_EQ(grown->capacity, 32);
+  ListSetRealloc(grown.get(), P(want[40] = 9), 40);  // slots 17 to 39 become null
+  ListSetRealloc(grown.get(), P(want[5] = 7), 5);
   PortTest::Capture cap;
-  ListSetRealloc(list, I(1), -1);
-  ASSERT_EQ(cap.size(), 1u);
-  EXPECT_EQ(cap[0].level, Port_Fatal);
-  EXPECT_EQ(cap[0].text, "Data corruption (ListAddElt) - Negative index\n");
-  EXPECT_EQ(list->count, 41);
-  ListQuickDelete(&list);
+  ListSetRealloc(grown.get(), P(1), -1);
+  ExpectReports(cap, Port_Fatal, {"Data corruption (ListAddElt) - Negative index\n"});
+  EXPECT_EQ(ShapeOf(grown.get()), Shape(want, 64));
 }
 
 TEST(ListCore, InsertAtEveryValidPositionAndRefuseOthers) {
-  DomList* list = make({1, 2});
-  EXPECT_EQ(ListInsertInList(list, I(7), 2), 1);
-  EXPECT_EQ(items(list), (V{1, 7, 2}));
-  EXPECT_EQ(ListInsertInList(list, I(8), 4), 1);
-  EXPECT_EQ(items(list), (V{1, 7, 2, 8}));
-  EXPECT_EQ(ListInsertInList(list, I(9), 1), 1);
-  EXPECT_EQ(items(list), (V{9, 1, 7, 2, 8}));
-
+  Owned list = Make({1, 2}), full = Make({1}, 1);
   PortTest::Capture cap;
-  EXPECT_EQ(ListInsertInList(list, I(5), 0), 0);
-  EXPECT_EQ(ListInsertInList(list, I(5), 7), 0);
-  EXPECT_EQ(ListInsertInList(nullptr, I(5), 1), 0);  // no list to insert into
-  ASSERT_EQ(cap.size(), 3u);
-  for (const Port_Report& r : cap.reports()) {
-    EXPECT_EQ(r.level, Port_Error);
-    EXPECT_EQ(r.text, "in ListInsertInList !!\n\n");
+  EXPECT_EQ((Ints{ListInsertInList(list.get(), P(7), 2), ListInsertInList(list.get(), P(8), 4),
+                  ListInsertInList(list.get(), P(9), 1), ListInsertInList(full.get(), P(2), 1),
+                  ListInsertInList(list.get(), P(5), 0), ListInsertInList(list.get(), P(5), 7),
+                  ListInsertInList(nullptr, P(5), 1)}),
+            (Ints{1, 1, 1, 1, 0, 0, 0}));
+  const char* refused = "in ListInsertInList !!\n\n";
+  ExpectReports(cap, Port_Error, {refused, refused, refused});
+  EXPECT_EQ(Of(list.get()), (Vals{9, 1, 7, 2, 8}));
+  EXPECT_EQ(ShapeOf(full.get()), Shape({2, 1}, 2));  // a full array grows
+}
+
+TEST(ListCore, RemovalsShiftOrFillFromTheEndAndCheckTheIndex) {
+  using Remove = int (*)(DomList*, int);
+  const std::tuple<const char*, Remove, Vals> removals[] = {
+      {"Data corruption (ListDelShift) - Bad Index\n", ListDelShift, {1, 3}},
+      {"Data corruption (ListDelShiftFree) - Bad Index\n",
+       [](DomList* l, int pos) { return ListDelShiftFree(l, pos, RecordFree); }, {1, 3}},
+      {"Data corruption (ListDelInsert) - Bad Index\n", ListDelInsert, {1, 4}},
+      {"Data corruption (ListDelInsertFree) - Bad Index\n",
+       [](DomList* l, int pos) { return ListDelInsertFree(l, pos, RecordFree); }, {1, 4}}};
+  for (const auto& [text, remove, after] : removals) {
+    Owned list = Make({1, 2, 3, 4});
+    PortTest::Capture cap;
+    EXPECT_EQ(remove(list.get(), 0) + remove(list.get(), -3) + remove(nullptr, 0), 3) << text;  // no-ops
+    EXPECT_EQ(remove(list.get(), 5) + remove(nullptr, 1), 0) << text;  // a null list counts as empty
+    ExpectReports(cap, Port_Fatal, {text, text});
+    EXPECT_EQ(Of(list.get()), (Vals{1, 2, 3, 4}));
+    EXPECT_EQ(remove(list.get(), 2), 1);
+    EXPECT_EQ(remove(list.get(), 3), 1);  // the last one
+    EXPECT_EQ(Of(list.get()), after) << text;
   }
-  EXPECT_EQ(items(list), (V{9, 1, 7, 2, 8}));
-
-  DomList* full = ListCreateWithSize(1);
-  ListAddElt(full, I(1));
-  EXPECT_EQ(ListInsertInList(full, I(2), 1), 1);  // insertion into a full array grows it
-  EXPECT_EQ(items(full), (V{2, 1}));
-  EXPECT_EQ(full->capacity, 2);
-  ListQuickDelete(&full);
-  ListQuickDelete(&list);
+  EXPECT_EQ(freed, (Vals{2, 4, 2, 3}));
 }
 
-TEST(ListCore, RemovalsKeepOrderOrFillFromTheEnd) {
-  DomList* list = make({1, 2, 3, 4});
-  EXPECT_EQ(ListDelShift(list, 2), 1);
-  EXPECT_EQ(items(list), (V{1, 3, 4}));
-  ListQuickDelete(&list);
-  list = make({1, 2, 3, 4});
-  EXPECT_EQ(ListDelInsert(list, 2), 1);
-  EXPECT_EQ(items(list), (V{1, 4, 3}));
-  EXPECT_EQ(ListDelInsert(list, 3), 1);  // the last one
-  EXPECT_EQ(items(list), (V{1, 4}));
+int SameParity(int* x, int* v) { return (V(x) & 1) == (V(v) & 1); }
 
-  freed.clear();
-  EXPECT_EQ(ListDelShiftFree(list, 1, recordFree), 1);
-  EXPECT_EQ(ListDelInsertFree(list, 1, recordFree), 1);
-  EXPECT_EQ(freed, (std::vector<int*>{I(1), I(4)}));
-  EXPECT_EQ(list->count, 0);
-  ListQuickDelete(&list);
-}
-
-TEST(ListCore, RemovalAtPositionZeroOrBelowIsANoOp) {
-  DomList* list = make({1, 2});
-  PortTest::Capture cap;
-  freed.clear();
-  EXPECT_EQ(ListDelShift(list, 0), 1);
-  EXPECT_EQ(ListDelInsert(list, -3), 1);
-  EXPECT_EQ(ListDelShiftFree(list, 0, recordFree), 1);
-  EXPECT_EQ(ListDelInsertFree(nullptr, 0, recordFree), 1);
-  EXPECT_EQ(ListDelShift(nullptr, 0), 1);
-  EXPECT_EQ(items(list), (V{1, 2}));
-  EXPECT_TRUE(freed.empty());
-  EXPECT_EQ(cap.size(), 0u);
-  ListQuickDelete(&list);
-}
-
-TEST(ListCore, BadIndexIsFatalAndChangesNothing) {
-  DomList* list = make({1, 2, 3, 4});
-  PortTest::Capture cap;
-  freed.clear();
-  EXPECT_EQ(ListDelShift(list, 5), 0);
-  EXPECT_EQ(ListDelShiftFree(list, 5, recordFree), 0);
-  EXPECT_EQ(ListDelInsert(list, 5), 0);
-  EXPECT_EQ(ListDelInsertFree(list, 5, recordFree), 0);
-  EXPECT_EQ(ListDelInsert(nullptr, 1), 0);
-  EXPECT_EQ(ListDelInsertFree(nullptr, 1, recordFree), 0);
-  EXPECT_EQ(ListDelShift(nullptr, 1), 0);  // a null list counts as empty
-  EXPECT_EQ(ListDelShiftFree(nullptr, 2, recordFree), 0);
-  const char* expected[] = {
-      "Data corruption (ListDelShift) - Bad Index\n",
-      "Data corruption (ListDelShiftFree) - Bad Index\n",
-      "Data corruption (ListDelInsert) - Bad Index\n",
-      "Data corruption (ListDelInsertFree) - Bad Index\n",
-      "Data corruption (ListDelInsert) - Bad Index\n",
-      "Data corruption (ListDelInsertFree) - Bad Index\n",
-      "Data corruption (ListDelShift) - Bad Index\n",
-      "Data corruption (ListDelShiftFree) - Bad Index\n",
-  };
-  ASSERT_EQ(cap.size(), 8u);
-  for (size_t i = 0; i < 8; ++i) {
-    EXPECT_EQ(cap[i].level, Port_Fatal);
-    EXPECT_EQ(cap[i].unit, "../s/listutil");
-    EXPECT_EQ(cap[i].text, expected[i]);
-  }
-  EXPECT_EQ(items(list), (V{1, 2, 3, 4}));
-  EXPECT_TRUE(freed.empty());
-  ListQuickDelete(&list);
-}
-
-static int sameParity(int* listElt, int* value) {
-  return (reinterpret_cast<intptr_t>(listElt) & 1) == (reinterpret_cast<intptr_t>(value) & 1);
-}
-
-static std::vector<std::pair<int*, int*>> calls;
-static int recordEqual(int* a, int* b, int* context) {
-  calls.emplace_back(a, b);
-  return a == b && context != nullptr;
-}
-
-TEST(ListCore, MembershipFindsTheFirstMatchWithTheElementFirst) {
-  DomList* list = make({10, 20, 10, -5});
-  EXPECT_EQ(ListMemberOfList(list, I(10)), 1);
-  EXPECT_EQ(ListMemberOfList(list, I(20)), 2);
-  EXPECT_EQ(ListMemberOfList(list, I(99)), 0);
-  EXPECT_EQ(ListMemberOfList(nullptr, I(10)), 0);
-  EXPECT_EQ(ListMemberOfList(list, I(3), sameParity), 4);
-  EXPECT_EQ(ListMemberOfListInt(list, -5), 4);
-  EXPECT_EQ(ListMemberOfListInt(nullptr, 10), 0);
+TEST(ListCore, MembershipAndCompaction) {
+  Owned list = Make({10, 20, 10, -5});
+  EXPECT_EQ((Ints{ListMemberOfList(list.get(), P(10)), ListMemberOfList(list.get(), P(99)),
+                  ListMemberOfList(nullptr, P(10)), ListMemberOfList(list.get(), P(3), SameParity),
+                  ListMemberOfListInt(list.get(), -5), ListMemberOfListInt(nullptr, 10)}),
+            (Ints{1, 0, 0, 4, 4, 0}));
   int ctx;
-  calls.clear();
-  EXPECT_EQ(ListContextualMemberOfList(list, I(20), recordEqual, &ctx), 2);
-  ASSERT_EQ(calls.size(), 2u);
-  EXPECT_EQ(calls[0], std::make_pair(I(10), I(20)));
-  EXPECT_EQ(calls[1], std::make_pair(I(20), I(20)));
-  ListQuickDelete(&list);
+  EXPECT_EQ(Recorded([&] { EXPECT_EQ(ListContextualMemberOfList(list.get(), P(20), CtxEqRec, &ctx), 2); }),
+            (Calls{{10, 20}, {20, 20}}));
+  EXPECT_EQ(lastContext, &ctx);
+  list = Make({1, 0, 2, 0});
+  EXPECT_EQ((Ints{ListCompact(list.get()), ListCompact(nullptr)}), (Ints{2, 0}));
+  EXPECT_EQ(ShapeOf(list.get()), Shape({1, 2}, 16));
 }
 
-TEST(ListCore, CompactRemovesNullsAndKeepsCapacity) {
-  DomList* list = make({1, 0, 2, 0});
-  EXPECT_EQ(ListCompact(list), 2);
-  EXPECT_EQ(items(list), (V{1, 2}));
-  EXPECT_EQ(list->capacity, 16);
-  EXPECT_EQ(ListCompact(nullptr), 0);
-  ListQuickDelete(&list);
-}
-
-static int* doubleIt(int* e) { return I(reinterpret_cast<intptr_t>(e) * 2); }
-static int* addContext(int* e, int* context) {
-  return I(reinterpret_cast<intptr_t>(e) + *context);
-}
+int* Double(int* e) { return P(V(e) * 2); }
+int* AddContext(int* e, int* context) { return P(V(e) + *context); }
 
 TEST(ListCore, CopiesAndJoins) {
-  DomList* src = make({1, 2, 3});
-  DomList* copy = ListCopy(src, doubleIt);
-  EXPECT_EQ(items(copy), (V{2, 4, 6}));
-  EXPECT_EQ(copy->capacity, 3);
   int ten = 10;
-  DomList* ctxCopy = ListContextualCopy(src, addContext, &ten);
-  EXPECT_EQ(items(ctxCopy), (V{11, 12, 13}));
-  DomList* shared = ListCopyNoEltCr(src);
-  EXPECT_EQ(items(shared), items(src));
+  Owned src = Make({1, 2, 3}), copy(ListCopy(src.get(), Double));
+  Owned shared(ListCopyNoEltCr(src.get())), emptyCopy(ListCopy(Make({}).get(), Double));
+  EXPECT_EQ(Take(ListContextualCopy(src.get(), AddContext, &ten)), (Vals{11, 12, 13}));
+  EXPECT_EQ(ShapeOf(copy.get()), Shape({2, 4, 6}, 3));  // sized to the source
+  EXPECT_EQ(ShapeOf(emptyCopy.get()), Shape({}, 1));
+  EXPECT_EQ(Of(shared.get()), (Vals{1, 2, 3}));
   EXPECT_NE(shared->elements, src->elements);
-  DomList* empty = ListCreate();
-  DomList* emptyCopy = ListCopy(empty, doubleIt);
-  EXPECT_EQ(emptyCopy->capacity, 1);
-  EXPECT_EQ(emptyCopy->count, 0);
-  EXPECT_EQ(ListCopy(nullptr, doubleIt), nullptr);
-  EXPECT_EQ(ListCopyNoEltCr(nullptr), nullptr);
-
-  ListAdd(copy, src, doubleIt);
-  EXPECT_EQ(items(copy), (V{2, 4, 6, 2, 4, 6}));
+  EXPECT_TRUE(ListCopy(nullptr, Double) == nullptr && ListCopyNoEltCr(nullptr) == nullptr);
+  ListAdd(copy.get(), src.get(), Double);
   EXPECT_EQ(copy->capacity, 6);
-  ListAddNoEltCr(src, src);  // a list joined to itself
-  EXPECT_EQ(items(src), (V{1, 2, 3, 1, 2, 3}));
-  ListAppend(copy, &shared);
-  EXPECT_EQ(shared, nullptr);
-  EXPECT_EQ(items(copy), (V{2, 4, 6, 2, 4, 6, 1, 2, 3}));
-  EXPECT_EQ(copy->capacity, 12);
-  ListAppend(copy, &shared);  // null source: nothing
-  ListAdd(copy, nullptr, doubleIt);
-  ListAddNoEltCr(copy, nullptr);
-  EXPECT_EQ(copy->count, 9);
-
-  for (DomList** l : {&src, &copy, &ctxCopy, &empty, &emptyCopy}) ListQuickDelete(l);
+  ListAddNoEltCr(src.get(), src.get());  // a list joined to itself
+  EXPECT_EQ(Of(src.get()), (Vals{1, 2, 3, 1, 2, 3}));
+  DomList* moved = shared.release();
+  ListAppend(copy.get(), &moved);  // LeakSanitizer checks that the source is released
+  EXPECT_EQ(moved, nullptr);
+  ListAppend(copy.get(), &moved);  // null sources add nothing
+  ListAdd(copy.get(), nullptr, Double);
+  ListAddNoEltCr(copy.get(), nullptr);
+  EXPECT_EQ(ShapeOf(copy.get()), Shape({2, 4, 6, 2, 4, 6, 1, 2, 3}, 12));
 }
 
-TEST(ListCore, DeleteCallsTheFreeCallbackOnEverySlotInOrder) {
-  DomList* list = make({1, 2, 3});
-  freed.clear();
-  ListDelete(&list, recordFree);
-  EXPECT_EQ(list, nullptr);
-  EXPECT_EQ(freed, (std::vector<int*>{I(1), I(2), I(3)}));
-  ListDelete(&list, recordFree);  // null: nothing
-  EXPECT_EQ(freed.size(), 3u);
-
-  DomList* heap = ListCreate();
-  for (int i = 0; i < 3; ++i) ListAddElt(heap, static_cast<int*>(vzl_malloc(8)));
-  ListDelete(&heap, ListElemFree);  // ASan checks that every element is released
-
-  static int seenContext = 0;
-  list = make({4, 5});
+TEST(ListCore, DeleteFreesEverySlotInOrder) {
+  DomList* list = ListCreate();
+  for (int i = 0; i < 3; ++i) ListAddElt(list, static_cast<int*>(vzl_malloc(8)));
+  ListDelete(&list, ListElemFree);  // LeakSanitizer checks every element
+  ListDelete(&list, ListElemFree);  // null: nothing
+  static long seen = 0;
+  list = Make({4, 5}).release();
   int ctx = 42;
-  ListContextualDelete(
-      &list, [](int**, int* context) { seenContext += *context; }, &ctx);
-  EXPECT_EQ(seenContext, 84);
+  ListContextualDelete(&list, [](int** slot, int* c) { seen = seen * 100 + V(*slot) + *c; }, &ctx);
+  EXPECT_EQ(seen, 4647);
   EXPECT_EQ(list, nullptr);
 }
 
-TEST(ListCore, RecordsAreReusedAndKillStartsAFreshPool) {
-  DomList* a = ListCreate();
-  DomList* keep = a;
-  ListQuickDelete(&a);
-  DomList* b = ListCreate();
-  EXPECT_EQ(b, keep);  // the released record comes back first
-  EXPECT_EQ(b->count, 0);
-  ListQuickDelete(&b);
-  ListKill();
-  DomList* c = ListCreateWithSize(3);
-  ASSERT_NE(c, nullptr);
-  ListAddElt(c, I(1));
-  EXPECT_EQ(c->count, 1);
-  ListQuickDelete(&c);
-  ListKill();
-}
-
-TEST(ListCore, CreationFailuresAreFatalAndReturnNull) {
+TEST(ListCore, RecordReuseAndCreationFailures) {
   PortTest::AllocFailureGuard guard;
+  DomList *list = ListCreate(), *first = list;
+  ListQuickDelete(&list);
   PortTest::Capture cap;
-  DomList* warm = ListCreate();  // the record pool exists from here on
-  ListQuickDelete(&warm);
-  PortTest::FailNthAlloc(1);  // the element array
+  PortTest::FailNthAlloc(1);  // the element array: the record goes back to the pool
   EXPECT_EQ(ListCreateWithSize(4), nullptr);
+  EXPECT_EQ(Owned(ListCreate()).get(), first);  // the last released record comes back first
   ListKill();
   PortTest::FailNthAlloc(1);  // the record pool itself
   EXPECT_EQ(ListCreate(), nullptr);
   EXPECT_EQ(ListCreateWithSize(-1), nullptr);
-  ASSERT_EQ(cap.size(), 3u);
-  EXPECT_EQ(cap[0].text, "Data corruption (ListCreateWithSize) - Memory Full\n");
-  EXPECT_EQ(cap[1].text, "Data corruption (ListCreateWithSize) - Memory Full\n");
-  EXPECT_EQ(cap[2].text, "Data corruption (ListCreateWithSize) - Negative index\n");
-  for (const Port_Report& r : cap.reports()) EXPECT_EQ(r.level, Port_Fatal);
-  // The record given back after a failed array is the next one handed out.
-  DomList* list = ListCreate();
-  ASSERT_NE(list, nullptr);
-  ListQuickDelete(&list);
+  const char* full = "Data corruption (ListCreateWithSize) - Memory Full\n";
+  ExpectReports(cap, Port_Fatal, {full, full, "Data corruption (ListCreateWithSize) - Negative index\n"});
+  EXPECT_EQ(Take(Make({1}, 3).release()), Vals{1});  // a fresh pool after the kill
 }
 
 TEST(ListCore, GrowthFailureEndsTheSessionWithCode3) {
   PortTest::AllocFailureGuard guard;
-  PortTest::Capture cap;
   static DomList* list;
-  list = ListCreate();
-  for (int i = 0; i < 16; ++i) ListAddElt(list, I(i));
+  list = Make(Vals(16, 1)).release();
+  void (*grows[])() = {[] { ListAddElt(list, P(9)); }, [] { ListSetRealloc(list, P(9), 100); },
+                       [] { ListSetRealloc(list, P(9), INT_MAX); }, [] { ListInsertInList(list, P(9), 1); }};
+  PortTest::Capture cap;
   PortTest::FailAllAllocs();
-  EXPECT_TRUE(ExitsToSession([] { ListAddElt(list, I(99)); }));
-  EXPECT_EQ(MainEVarReturnStatus, 3);
-  EXPECT_TRUE(ExitsToSession([] { ListSetRealloc(list, I(99), 100); }));
-  MainEVarReturnStatus = 0;
-  EXPECT_TRUE(ExitsToSession([] { ListInsertInList(list, I(99), 1); }));
-  EXPECT_EQ(MainEVarReturnStatus, 3);
-  ASSERT_EQ(cap.size(), 3u);
-  for (const Port_Report& r : cap.reports()) {
-    EXPECT_EQ(r.level, Port_Fatal);
-    EXPECT_EQ(r.text, "Data corruption (ListAddElt) - Memory Full\n");
+  for (auto grow : grows) {
+    MainEVarReturnStatus = 0;
+    EXPECT_TRUE(ExitsToSession(grow));
+    EXPECT_EQ(MainEVarReturnStatus, 3);
   }
-  EXPECT_EQ(list->count, 16);
-  EXPECT_EQ(list->capacity, 16);
+  const char* full = "Data corruption (ListAddElt) - Memory Full\n";
+  ExpectReports(cap, Port_Fatal, {full, full, full, full});
+  EXPECT_EQ(ShapeOf(list), Shape(Vals(16, 1), 16));
   PortTest::ResetAllocFailures();
   ListQuickDelete(&list);
 }
 
-static std::string printed;
-static void printCollect(FILE*, int* e) { printed += std::to_string(reinterpret_cast<intptr_t>(e)); }
+std::string printed;
+void PrintCollect(FILE*, int* e) { printed += std::to_string(V(e)); }
 
-TEST(ListCore, PrintSeparatesElementsOnly) {
+TEST(ListCore, PrintSeparatesElementsByTheMainOutputRuleAndDisplayDumps) {
   FILE* devnull = fopen("/dev/null", "w");
   MainEVarOutFile = devnull;
   PortTest::Capture cap;
-  DomList* list = make({1, 2, 3});
-  printed.clear();
-  ListPrint(devnull, list, printCollect, ", ");
-  EXPECT_EQ(printed, "123");
-  EXPECT_EQ(cap.text(), ", , ");
-  DomList* empty = ListCreate();
-  ListPrint(devnull, empty, printCollect, ", ");
-  ListPrint(devnull, nullptr, printCollect, ", ");
+  Owned list = Make({1, 2, 3});
+  ListPrint(devnull, list.get(), PrintCollect, ", ");
+  ListPrint(devnull, Make({}).get(), PrintCollect, ", ");
+  ListPrint(devnull, nullptr, PrintCollect, ", ");
   int ctx = 0;
-  ListContextualPrint(
-      devnull, list, [](FILE*, int*, int* c) { ++*c; }, "/", &ctx);
-  EXPECT_EQ(ctx, 3);
-  EXPECT_EQ(cap.text(), ", , //");
-  EXPECT_EQ(printed, "123");
+  ListContextualPrint(devnull, list.get(), [](FILE*, int*, int* c) { ++*c; }, "/", &ctx);
+  EXPECT_EQ(printed + std::to_string(ctx), "1233");
+  EXPECT_EQ(cap.text(Port_Status), ", , //");
+  EXPECT_EQ(cap.size(), 4u);
   MainEVarOutFile = nullptr;
   fclose(devnull);
-  ListQuickDelete(&list);
-  ListQuickDelete(&empty);
-}
-
-TEST(ListCore, DisplayDumpsCapacityCountAndElements) {
-  DomList* list = make({0x1f, 0x2});
+  list = Make({0x1f, 0x2});
   testing::internal::CaptureStdout();
-  ListDisplay(list);
+  ListDisplay(list.get());
   std::string text = testing::internal::GetCapturedStdout();
   EXPECT_EQ(text.rfind("Taille 16, Elt 2, Adresse ", 0), 0u);
   EXPECT_NE(text.find("\n      1f       2\n"), std::string::npos);
-  ListQuickDelete(&list);
 }
+
+}  // namespace

@@ -1,5 +1,5 @@
 // Shared helpers of the list tests: integer elements in pointer cells, owned
-// lists, recording callbacks and random data.
+// lists, recording callbacks, report checks and random data.
 #pragma once
 
 #include <gtest/gtest.h>
@@ -7,13 +7,16 @@
 #include <cstdint>
 #include <memory>
 #include <random>
+#include <string>
 #include <utility>
 #include <vector>
 
 #include "duduzu/duduzu.h"
+#include "port/port_testing.h"
 
 using Vals = std::vector<long>;
 using Calls = std::vector<std::pair<long, long>>;
+using Ints = std::vector<int>;  // several results compared at once
 
 inline int* P(long v) { return reinterpret_cast<int*>(static_cast<intptr_t>(v)); }
 inline long V(const int* p) { return static_cast<long>(reinterpret_cast<intptr_t>(p)); }
@@ -34,41 +37,41 @@ inline Vals Of(const DomList* list) {
   for (int i = 0; list && i < list->count; ++i) out.push_back(V(list->elements[i]));
   return out;
 }
+// The values of a new list (null: none), which is then released.
+inline Vals Take(DomList* list) { return Of(Owned(list).get()); }
+// The values and the capacity of a list.
+using Shape = std::pair<Vals, int>;
+inline Shape ShapeOf(const DomList* list) { return {Of(list), list->capacity}; }
+
+// Exactly these reports, each of `level` and of the list unit.
+inline void ExpectReports(const PortTest::Capture& cap, Port_MsgLevel level,
+                          const std::vector<std::string>& texts) {
+  ASSERT_EQ(cap.size(), texts.size());
+  for (size_t i = 0; i < texts.size(); ++i) {
+    EXPECT_EQ(cap[i].level, level);
+    EXPECT_EQ(cap[i].unit, "../s/listutil");
+    EXPECT_EQ(cap[i].text, texts[i]);
+  }
+}
 
 // The recording callbacks append (first argument, second argument) to `calls`.
 inline Calls calls;
 inline int* lastContext = nullptr;
 template <class F>
-Calls Recorded(F f) {
-  calls.clear();
-  f();
-  return calls;
-}
+Calls Recorded(F f) { return calls.clear(), f(), calls; }
 
 inline int Eq(int* x, int* v) { return V(x) == V(v); }
-inline int EqRec(int* x, int* v) {
-  calls.push_back({V(x), V(v)});
-  return Eq(x, v);
-}
-inline int CtxEqRec(int* x, int* v, int* context) {
-  lastContext = context;
-  return EqRec(x, v);
-}
+inline int EqRec(int* x, int* v) { return calls.push_back({V(x), V(v)}), Eq(x, v); }
+inline int CtxEqRec(int* x, int* v, int* context) { return lastContext = context, EqRec(x, v); }
 // Three-way comparison of keys: value / 1000, so that elements of equal keys differ.
 inline int Cmp(int* a, int* b) { return (V(a) / 1000 > V(b) / 1000) - (V(a) / 1000 < V(b) / 1000); }
-inline int CmpRec(int* a, int* b) {
-  calls.push_back({V(a), V(b)});
-  return Cmp(a, b);
-}
-inline int CtxCmpRec(int* a, int* b, int* context) {
-  lastContext = context;
-  return CmpRec(a, b);
-}
+inline int CmpRec(int* a, int* b) { return calls.push_back({V(a), V(b)}), Cmp(a, b); }
+inline int CtxCmpRec(int* a, int* b, int* context) { return lastContext = context, CmpRec(a, b); }
 
-// size values key * 1000 + id: keys from 1 to range, ids firstId, firstId + 1, ...
-inline Vals Keyed(std::mt19937& rng, int size, long range, long firstId = 0) {
+// Up to maxSize values key * 1000 + id: keys from 1 to range, ids firstId, firstId + 1, ...
+inline Vals Keyed(std::mt19937& rng, int maxSize, long range, long firstId = 0) {
   std::uniform_int_distribution<long> key(1, range);
-  Vals out;
-  for (int i = 0; i < size; ++i) out.push_back(key(rng) * 1000 + firstId + i);
+  Vals out(rng() % static_cast<unsigned>(maxSize + 1));
+  for (size_t i = 0; i < out.size(); ++i) out[i] = key(rng) * 1000 + firstId + static_cast<long>(i);
   return out;
 }

@@ -15,6 +15,7 @@
 #include "port/port_testing.h"
 
 using Cells = std::vector<unsigned int>;
+using Mints = std::vector<Cells>;  // several results compared at once
 
 // The first `cells` cells of a created Mint, which is then released.
 inline Cells take(unsigned int* m, int cells) {
@@ -37,7 +38,6 @@ struct Mpz {
     mpz_import(z, m.size(), -1, sizeof(unsigned int), 0, 0, m.data());
   }
   ~Mpz() { mpz_clear(z); }
-  int compare(const Mpz& o) const { return mpz_cmp(z, o.z); }
   std::string text(int base) const {  // upper-case digits
     char* s = mpz_get_str(nullptr, base, z);
     std::string t(s);
@@ -47,31 +47,29 @@ struct Mpz {
   }
 };
 
-// What `print` writes to a real stream.
+// What `print` writes to a real stream, then what it writes as the main
+// output: status reports of the unit, counted in `reports`.
 template <class F>
-std::string printed(F print) {
+std::string printed(F print, size_t* reports = nullptr) {
   FILE* s = tmpfile();
   print(s);
   rewind(s);
   std::string text;
   for (int c; (c = fgetc(s)) != EOF;) text += static_cast<char>(c);
   fclose(s);
-  return text;
-}
-
-// Runs `print` with MainEVarOutFile set; every report must be a status report
-// of the unit. Returns the number of reports.
-template <class F>
-size_t printedToMainOutput(F print, const PortTest::Capture& cap) {
+  if (!reports) return text;
+  PortTest::Capture cap;
   FILE* saved = MainEVarOutFile;
   MainEVarOutFile = stderr;
-  print();
+  print(MainEVarOutFile);
   MainEVarOutFile = saved;
   for (const Port_Report& r : cap.reports()) {
     EXPECT_EQ(r.level, Port_Status);
     EXPECT_EQ(r.unit, "../s/multint");
   }
-  return cap.size();
+  EXPECT_EQ(cap.text(), text);
+  *reports = cap.size();
+  return text;
 }
 
 // Exactly one error report "Memory Full (Function <creator>)\n" of the unit.

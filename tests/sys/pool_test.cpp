@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include <cstring>
+#include <string>
 
 #include "duduzu/pool.h"
 #include "port/port_testing.h"
@@ -19,37 +20,25 @@ TEST(Pool, CarvesBlocksAndCountsThem) {
   char* fifth = PoolGetNewElt(pool);
   EXPECT_EQ(pool->blocks->count, 2);
   EXPECT_EQ(fifth, static_cast<char*>(pool->blocks->elements[1]));
-  for (int i = 0; i < 16; ++i) EXPECT_EQ(fifth[i], 0);
+  EXPECT_EQ(std::string(fifth, 16), std::string(16, '\0'));
   PoolKill(&pool);
   EXPECT_EQ(pool, nullptr);
   PoolKill(&pool);  // null: nothing
 }
 
 TEST(Pool, ReusesLastReleasedFirstAndClearsOnlyTheFirstItem) {
-  DomPool* pool = PoolInit(8, 3, 4);  // 12-byte elements, 96-byte blocks
-  char* e1 = PoolGetNewElt(pool);
-  char* e2 = PoolGetNewElt(pool);
-  EXPECT_EQ(e2 - e1, 12);
-  memset(e1, 0xAB, 12);
-  memset(e2, 0xCD, 12);
-  PoolReleaseElt(pool, e1);
-  PoolReleaseElt(pool, e2);
-  EXPECT_EQ(PoolGetNewElt(pool), e2);
-  EXPECT_EQ(PoolGetNewElt(pool), e1);
-  for (int i = 0; i < 4; ++i) EXPECT_EQ(e1[i], 0);
-  for (int i = 4; i < 12; ++i) EXPECT_EQ(static_cast<unsigned char>(e1[i]), 0xAB);
-  for (int i = 4; i < 12; ++i) EXPECT_EQ(static_cast<unsigned char>(e2[i]), 0xCD);
-  PoolKill(&pool);
-}
-
-TEST(Pool, ReleasesBeyondTheFreeStackCapacityGrowIt) {
-  DomPool* pool = PoolInit(2, 1, 8);
+  DomPool* pool = PoolInit(2, 3, 4);  // 12-byte elements, 24-byte blocks, a free stack of 2
   char* e[5];
   for (char*& p : e) p = PoolGetNewElt(pool);
+  EXPECT_EQ(e[1] - e[0], 12);
+  memset(e[0], 0xAB, 12);
+  memset(e[1], 0xCD, 12);
   for (char* p : e) PoolReleaseElt(pool, p);
-  EXPECT_EQ(pool->freeElts->count, 5);
+  EXPECT_EQ(pool->freeElts->count, 5);  // the free stack grows past its capacity
   EXPECT_EQ(pool->freeElts->capacity, 8);
   for (int i = 4; i >= 0; --i) EXPECT_EQ(PoolGetNewElt(pool), e[i]);
+  EXPECT_EQ(std::string(e[0], 12), std::string(4, '\0') + std::string(8, '\xAB'));
+  EXPECT_EQ(std::string(e[1], 12), std::string(4, '\0') + std::string(8, '\xCD'));
   PoolKill(&pool);
 }
 
