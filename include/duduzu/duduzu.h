@@ -10,6 +10,7 @@
 #include "duduzu/param.h"
 #include "duduzu/pool.h"
 #include "duduzu/qelmsg.h"
+#include "duduzu/redirect.h"
 #include "duduzu/session.h"
 #include "duduzu/str.h"
 #include "duduzu/strlist.h"

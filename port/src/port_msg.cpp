@@ -163,6 +163,12 @@ bool Port_MsgStream::isMsgTypeEnabled(Port::Stream* stream, int type) const {
   return o && type >= 0 && type <= 8 && (o->typeMask >> type & 1u);
 }
 
+std::vector<Port::Stream*> Port_MsgStream::attachedStreams() const {
+  std::vector<Port::Stream*> streams;
+  for (const Output& o : outputs_) streams.push_back(o.stream);
+  return streams;
+}
+
 void Port_MsgStream::receive(const Port_Report& report) {
   std::string text = Port_FormatReport(report);
   for (const Output& o : outputs_)

@@ -11,14 +11,7 @@ struct QelMsgHandOver {
 
 extern QelMsgHandOver qelMsgHandOver;
 
-// The setters are internal. Builds with tests make them visible so that the
-// message-control tests can hand state over the way the set-up does.
-#ifdef DUDUZU_TESTING
-#define DZ_TESTING_API __attribute__((visibility("default")))
-#else
-#define DZ_TESTING_API
-#endif
-
-DZ_TESTING_API void SetQelMsgQuiet(bool quiet);
-DZ_TESTING_API void SetQelMsgStream(Port_MsgStream* stream);
-DZ_TESTING_API void SetQelMsgLogStream(Port::Stream* stream);
+// Internal setters, called by the message-manager set-up alone.
+void SetQelMsgQuiet(bool quiet);
+void SetQelMsgStream(Port_MsgStream* stream);
+void SetQelMsgLogStream(Port::Stream* stream);

@@ -123,9 +123,11 @@ class PORT_API Port_MsgStream : public Port_MsgMan {
   virtual void disableMsgType(Port::Stream* stream, int type);
 
   void receive(const Port_Report& report) override;
-  // Test view: whether the output is attached, and whether a type reaches it.
+  // Test view: whether the output is attached, whether a type reaches it, and
+  // the attached outputs in the order they were added.
   bool isAttached(Port::Stream* stream) const;
   bool isMsgTypeEnabled(Port::Stream* stream, int type) const;
+  std::vector<Port::Stream*> attachedStreams() const;
 
  private:
   struct Output {
