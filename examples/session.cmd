@@ -25,7 +25,8 @@ words a,"b,c",d
 compose work/top.v -dir out/ -suffix _syn -ext edf
 compose work/top.v -suffix _old -mode 1
 compose top -mode 9
-expand $DUDUZU_SESSION_NAME/out
+expand $HOME/designs
+expand $DUDUZU_NO_SUCH_NAME/designs
 range d -from 0 -to 3
 range d -from 2 -to 4 -hdl
 

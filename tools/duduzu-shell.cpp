@@ -28,7 +28,6 @@
 #include <vector>
 
 #include "duduzu/duduzu.h"
-#include "duduzu/redirect.h"
 
 namespace {
 
