@@ -443,7 +443,10 @@ int main(int argc, char** argv) {
       fputs("duduzu> ", stdout);
       fflush(stdout);
     }
-    if (getline(&session.line, &session.lineSize, session.script) < 0) break;
+    if (getline(&session.line, &session.lineSize, session.script) < 0) {
+      if (interactive) fputs("\n", stdout);
+      break;
+    }
     ++scriptLine;
     runLine(session.line);
   }
