@@ -31,6 +31,22 @@
 
 namespace {
 
+// ---- session state ----
+
+// Everything the loop needs after a long jump lives here, not in a stack frame.
+struct Session {
+  FILE* script = nullptr;
+  bool echo = false;     // echo each command line (not when typing at a terminal)
+  char* line = nullptr;  // the line being run (getline's buffer)
+  size_t lineSize = 0;
+  int lineNumber = 0;
+  const char* command = "";   // name of the command being run
+  DomList* params = nullptr;  // its parameter list, released after it ran or unwound
+  int depth = 0;              // redirections not yet restored
+  bool quit = false;
+};
+Session session;
+
 // ---- output and reports ----
 
 std::string formatV(const char* fmt, va_list ap) {
@@ -52,15 +68,13 @@ __attribute__((format(printf, 1, 2))) void say(const char* fmt, ...) {
   va_end(ap);
 }
 
-int scriptLine = 0;  // number of the line being run
-
 // The tool's own error messages, reported like the library's and prefixed
 // with the script line.
 __attribute__((format(printf, 2, 3))) void complainAt(int line, const char* fmt, ...) {
   va_list ap;
   va_start(ap, fmt);
   Port_MsgManData::createObject("DuduzuShell", "tools/duduzu-shell", line, "$Revision: 1.1 $")
-      ->issueError("line %d: %s", scriptLine, formatV(fmt, ap).c_str());
+      ->issueError("line %d: %s", session.lineNumber, formatV(fmt, ap).c_str());
   va_end(ap);
 }
 #define COMPLAIN(...) complainAt(__LINE__, __VA_ARGS__)
@@ -111,19 +125,6 @@ int number(DomList* p, const char* name, int fallback) {
 }
 
 // ---- commands ----
-
-struct Session {
-  FILE* script = nullptr;
-  bool echo = false;        // echo each command line (not when typing at a terminal)
-  char* line = nullptr;     // the line being run (getline's buffer)
-  size_t lineSize = 0;
-  const char* command = ""; // name of the command being run
-  DomList* params = nullptr;  // its parameter list, released after it ran or unwound
-  int depth = 0;            // redirections not yet restored
-  bool quit = false;
-};
-// Everything the loop needs after a long jump lives here, not in a stack frame.
-Session session;
 
 bool isBase(int base) { return base == 2 || base == 8 || base == 10 || base == 16; }
 
@@ -204,8 +205,7 @@ void cmdWords(DomList* p) { sayList(StrToWordList(arg(p, 0), " \t,;"), "words");
 
 void cmdCompose(DomList* p) {
   int mode = number(p, "mode", 0);
-  char* name =
-      StrComposeName(arg(p, 0), text(p, "dir"), text(p, "suffix"), text(p, "ext"), mode);
+  char* name = StrComposeName(arg(p, 0), text(p, "dir"), text(p, "suffix"), text(p, "ext"), mode);
   if (name)
     say("%s\n", name);
   else
@@ -373,8 +373,8 @@ void runLine(char* line) {
   // The checker only reads the descriptor strings.
   if (!ParamCheckParamList(name, params, const_cast<char*>(c->positional),
                            const_cast<char*>(c->options), &session.params)) {
-    COMPLAIN("%s: parameters '%s' rejected; %s takes \"%s\" \"%s\"\n", c->name, params,
-             c->name, c->positional, c->options);
+    COMPLAIN("%s: parameters '%s' rejected; %s takes \"%s\" \"%s\"\n", c->name, params, c->name,
+             c->positional, c->options);
   } else {
     unquoteValues(session.params);
     c->run(session.params);
@@ -434,7 +434,7 @@ int main(int argc, char** argv) {
   KERBTmpDir = SystemGetTempPath();
   if (setjmp(RestartSession) != 0) {
     // A fatal condition ended the command: report its status, drop its parameters.
-    say("line %d: %s: return status %d\n", scriptLine, session.command,
+    say("line %d: %s: return status %d\n", session.lineNumber, session.command,
         MainEVarReturnStatus);
     ListDelete(&session.params, freeParam);
   }
@@ -447,7 +447,7 @@ int main(int argc, char** argv) {
       if (interactive) fputs("\n", stdout);
       break;
     }
-    ++scriptLine;
+    ++session.lineNumber;
     runLine(session.line);
   }
   endSession();

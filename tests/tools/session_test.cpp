@@ -12,9 +12,9 @@
 namespace {
 
 struct ShellRun {
-  int status;          // the tool's exit status
-  std::string out;     // standard output
-  std::string err;     // standard error
+  int status;       // the tool's exit status
+  std::string out;  // standard output
+  std::string err;  // standard error
 };
 
 // Runs the tool in `work` (also its TMPDIR) with a fixed environment and
@@ -22,12 +22,13 @@ struct ShellRun {
 ShellRun RunShell(const TempDir& work, const std::string& args, const std::string& input = "") {
   TempDir io;
   WriteFile(io / "in", input);
-  std::string command = "cd '" + work.path + "' && env -u DUDUZU_NO_SUCH_NAME HOME=/home/designer TMPDIR='" +
-                        work.path + "' '" DUDUZU_SHELL "' -clock 12340 " + args + " <'" +
-                        io / "in" + "' >'" + io / "out" + "' 2>'" + io / "err" + "'";
+  std::string command = "cd '" + work.path +
+                        "' && env -u DUDUZU_NO_SUCH_NAME HOME=/home/designer TMPDIR='" + work.path +
+                        "' '" DUDUZU_SHELL "' -clock 12340 " + args + " <'" + io / "in" + "' >'" +
+                        io / "out" + "' 2>'" + io / "err" + "'";
   int status = system(command.c_str());
   return ShellRun{WIFEXITED(status) ? WEXITSTATUS(status) : -1, ReadFile(io / "out"),
-             ReadFile(io / "err")};
+                  ReadFile(io / "err")};
 }
 
 // text with every occurrence of `from` replaced by `to`.
@@ -62,13 +63,13 @@ TEST(SampleSession, OutputMatchesTranscriptAndNothingIsLeftBehind) {
 TEST(Redirection, CapturesOutputAndMessagesUntilRestoredAndCopyDuplicatesTheFile) {
   TempDir work;
   ShellRun run = RunShell(work, "",
-                     "mint 255 -to 16\n"
-                     "redirect out.txt\n"
-                     "  # comments and blank lines are skipped\n\n"
-                     "mint 255 -to 2\n"
-                     "mint\n"
-                     "restore\n"
-                     "copy -ifn out.txt -ofn copy.txt\n");
+                          "mint 255 -to 16\n"
+                          "redirect out.txt\n"
+                          "  # comments and blank lines are skipped\n\n"
+                          "mint 255 -to 2\n"
+                          "mint\n"
+                          "restore\n"
+                          "copy -ifn out.txt -ofn copy.txt\n");
   EXPECT_EQ(run.status, 0);
   EXPECT_EQ(run.out,
             "> mint 255 -to 16\nFF\n> redirect out.txt\n"
