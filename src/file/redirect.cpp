@@ -74,9 +74,7 @@ void UnsetQelMsgMan() {
   Port_MsgDispatcher::addMsgMan(defaultMan);
   Port_MsgDispatcher::removeMsgMan(msgStream);
   if (currentLog) Port::File::close(currentLog);
-  currentLog = nullptr;
   delete msgStream;
-  msgStream = nullptr;
   // Message control must not keep the stream or the log it no longer has.
   SetQelMsgStream(nullptr);
   SetQelMsgLogStream(nullptr);
