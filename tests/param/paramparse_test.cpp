@@ -1,13 +1,6 @@
-#include <gtest/gtest.h>
-
-#include <string>
-
 #include "param_test_util.h"
 
 namespace {
-
-char* C(const char* s) { return const_cast<char*>(s); }
-
 // Outcome of a check and the list it left.
 std::string Check(const char* command, const char* params, const char* d1, const char* d2 = "") {
   DomList* list = nullptr;
@@ -16,10 +9,9 @@ std::string Check(const char* command, const char* params, const char* d1, const
   DeleteList(&list);
   return s;
 }
-
 }  // namespace
 
-TEST(ParamWords, ThreeExtractors) {
+TEST(ParamWords, ThreeExtractorsAndTheCutAt999) {
   char text[] = "  top \t\"a b\" \"\" x\"y \"abc";
   char* c = text;
   for (const char* want : {"top", "a b", "<null>", "x\"y", "abc", "<null>"})
@@ -35,10 +27,6 @@ TEST(ParamWords, ThreeExtractors) {
     EXPECT_EQ(ParamExtractWordFromStrQuote(&c, &word), want.first);
     EXPECT_STREQ(buffer, want.second);
   }
-  EXPECT_EQ(word, buffer);
-}
-
-TEST(ParamWords, LongWordsAreCutAt999WithTheWarning) {
   PortTest::Capture cap;
   for (std::string text : {std::string(1500, 'w') + " next", "\"" + std::string(1500, 'w') + "\" next"}) {
     char* c = &text[0];
@@ -47,10 +35,6 @@ TEST(ParamWords, LongWordsAreCutAt999WithTheWarning) {
     EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), "next");  // the cut part is consumed
     cap.clear();
   }
-  std::string text(998, 'w');
-  char* c = &text[0];
-  EXPECT_EQ(Owned(ParamExtractWordFromStrWithQuote(&c)), text);
-  EXPECT_EQ(cap.size(), 0u);
 }
 
 TEST(ParamParse, GrammarAndUncheckedCommands) {
@@ -73,9 +57,7 @@ TEST(ParamCheck, DescriptorAcceptance) {
     outcomes += Check("c", params, d)[0];
   EXPECT_EQ(outcomes, "001001");
   EXPECT_EQ(Check("c", "top -depth 3", "S", "-DEPTH I")[0], '1');
-  EXPECT_EQ(Check("c", "top -depth x", "S -depth Q")[0], '0');
-  EXPECT_EQ(Check("c", "", "-v") + Check("c", "", "S -v") + Check("c", "", ""), "1 <null>0 <null>1 <null>");
-  EXPECT_EQ(Check("c", "x", "")[0] + std::string(1, Check("c", "top", "S", "-a 1 2")[0]), "00");
+  EXPECT_EQ(Check("c", "", "-v") + Check("c", "", "S -v") + Check("c", "x", ""), "1 <null>0 <null>0 =x");
   PortTest::Capture cap;
   EXPECT_EQ(Check("c", "top -unknown 1 -depth -5", d), "1 =top;unknown=1;depth=;5=");
   EXPECT_EQ(Reports(cap), "1:skipping parameter : unknown\n1:skipping parameter : 5\n");
