@@ -67,29 +67,26 @@ TEST(FileOpenAlternate, FallsBackToTheDirectory) {
   EXPECT_TRUE(Exists("lib/nodir/w.v"));
   EXPECT_EQ(Reports(cap), "");
   // Neither candidate: reported with the name as passed, only when asked.
-  EXPECT_EQ(FileOpenReadAlternate("g.v", "lib/", 0), nullptr);
-  EXPECT_EQ(FileOpenReadAlternate("g.v", nullptr, 1), nullptr);
-  EXPECT_EQ(FileOpenReadAlternate(nullptr, "lib/", 1), nullptr);
-  EXPECT_EQ(FileOpenReadAlternate("g.v", "lib/", 1), nullptr);
-  EXPECT_EQ(FileOpenWriteAlternate("nodir/w.v", "none/", 1), nullptr);
+  EXPECT_TRUE(!FileOpenReadAlternate("g.v", "lib/", 0) && !FileOpenReadAlternate("g.v", nullptr, 1) &&
+              !FileOpenReadAlternate(nullptr, "lib/", 1) && !FileOpenReadAlternate("g.v", "lib/", 1) &&
+              !FileOpenWriteAlternate("nodir/w.v", "none/", 1));
   EXPECT_EQ(Reports(cap), "4:File not found : g.v\n4:File not found : nodir/w.v\n");
 }
 
 TEST(FileExist, ModesNullArgumentsAndRemoval) {
   TempDir dir;
-  std::string name = dir / "f";
+  std::string name = dir / "f", missing = dir / "missing", created = dir / "new";
   WriteFile(name, "content");
-  EXPECT_EQ(FileExist(name.c_str(), "x") + FileExist(name.c_str(), nullptr) + FileExist(nullptr, "r"), 0);
-  EXPECT_EQ(FileExist(name.c_str(), "R"), 1);
+  EXPECT_EQ(FileExist(name.c_str(), "x") + FileExist(name.c_str(), nullptr) + FileExist(nullptr, "r") +
+                FileExist(missing.c_str(), "r") + FileExist((dir / "no/such").c_str(), "w"), 0);
+  EXPECT_EQ(FileExist(name.c_str(), "R") * 10 + FileExist(created.c_str(), "w"), 11);  // "w" creates
   EXPECT_EQ(ReadFile(name), "content");
-  EXPECT_EQ(FileExist(name.c_str(), "W"), 1);  // truncates
+  EXPECT_EQ(FileExist(name.c_str(), "W"), 1);  // and truncates
   EXPECT_EQ(ReadFile(name), "");
-  EXPECT_EQ(FileExist((dir / "missing").c_str(), "r") + FileExist((dir / "no/such").c_str(), "w"), 0);
-  EXPECT_EQ(FileExist((dir / "new").c_str(), "w"), 1);  // creates
   FileRemoveFile(name.c_str());
-  FileRemoveFile((dir / "missing").c_str());
+  FileRemoveFile(missing.c_str());
   FileRemoveFile(nullptr);
-  EXPECT_EQ(Present({name, dir / "missing", dir / "new"}), "001");
+  EXPECT_EQ(Present({name, missing, created}), "001");
 }
 
 TEST(FileCopy, NameToNameEveryByteAndFromAPseudoFile) {
