@@ -14,7 +14,8 @@ inline std::string Reports(PortTest::Capture& cap) { return Reports(cap, "../s/f
 // Number of open descriptors of the process.
 inline int OpenFdCount() {
   int n = 0;
-  for (auto it = std::filesystem::directory_iterator("/proc/self/fd"); it != std::filesystem::directory_iterator(); ++it)
+  for (auto it = std::filesystem::directory_iterator("/proc/self/fd"); it != std::filesystem::directory_iterator();
+       ++it)
     ++n;
   return n;
 }

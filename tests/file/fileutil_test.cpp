@@ -146,8 +146,8 @@ TEST(FileNames, SplittersAndTheirDotRules) {
     EXPECT_EQ(Owned(FileRemoveExtension(name)), want) << name;
   for (auto [name, want] : {Case{"name", ""}, {"a/b/c.v", "a/b/"}, {"/x", "/"}, {"a\\b/c", "a\\"}})  // a backslash wins
     EXPECT_EQ(dirName(name), want) << name;
-  for (auto [name, want] : {Case{"a.b/c", "<null>"}, {"c:x", "<null>"}, {"d\\x", "<null>"}, {"x.", ""}, {".v", "<null>"},
-                            {"a.b.c", "c"}, {"d.e/f.g", "g"}, {"x", "<null>"}, {"", "<null>"}})
+  for (auto [name, want] : {Case{"a.b/c", "<null>"}, {"c:x", "<null>"}, {"d\\x", "<null>"}, {"x.", ""},
+                            {".v", "<null>"}, {"a.b.c", "c"}, {"d.e/f.g", "g"}, {"x", "<null>"}, {"", "<null>"}})
     EXPECT_EQ(extension(name), want) << name;
   EXPECT_TRUE(!FileRemoveExtension(nullptr) && !FileGetDirName(nullptr) && !FileGetFileExtension(nullptr));
 }

@@ -14,7 +14,8 @@ std::string Check(const char* command, const char* params, const char* d1, const
 TEST(ParamWords, ThreeExtractorsAndTheCutAt999) {
   char text[] = "  top \t\"a b\" \"\" x\"y \"abc";
   char *c = text, buffer[16], *word = buffer;
-  for (const char* want : {"top", "a b", "<null>", "x\"y", "abc", "<null>"}) EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), want);
+  for (const char* want : {"top", "a b", "<null>", "x\"y", "abc", "<null>"})
+    EXPECT_EQ(Owned(ParamExtractWordFromStr(&c)), want);
   EXPECT_EQ(c, text + sizeof(text) - 1);
   c = text;
   for (const char* want : {"top", "\"a b\"", "\"\"", "x\"y", "\"abc", "<null>"})
@@ -41,7 +42,8 @@ TEST(ParamParse, GrammarAndDescriptorAcceptance) {
   const char* d = "S -depth I -v";
   EXPECT_EQ(Check("c", "top -depth x", d), "0 =top;depth=x");  // the rejected list stays
   std::string outcomes;
-  for (const char* params : {"top -depth 3 -v", "-depth 3", "top extra", "top -depth", "top -v 1", "top -v -v", "top -v -V"})
+  for (const char* params :
+       {"top -depth 3 -v", "-depth 3", "top extra", "top -depth", "top -v 1", "top -v -v", "top -v -V"})
     outcomes += Check("c", params, d)[0];
   EXPECT_EQ(outcomes + Check("c", "top -depth 3", "S", "-DEPTH I")[0], "10010011");
   EXPECT_EQ(Check("c", "", "-v") + Check("c", "", "S -v") + Check("c", "x", ""), "1 <null>0 <null>0 =x");

@@ -42,12 +42,14 @@ TEST(RadixCheck, PlainAndSizedForms) {
 
 // Random decimals of any length against GMP; their bits back through octal and hexadecimal digits.
 TEST(RadixConvert, DecimalMatchesGmpAndBitsRoundTrip) {
-  EXPECT_EQ(Conv(StrDecimalToBin, "", 4) + Conv(StrDecimalToBin, "007", 12) + Conv(StrHexaToBin, "Aa", 8), "11110101010");
+  EXPECT_EQ(Conv(StrDecimalToBin, "", 4) + Conv(StrDecimalToBin, "007", 12) + Conv(StrHexaToBin, "Aa", 8),
+            "11110101010");
   EXPECT_EQ(Conv(StrBinToHexa, "11111", 0) + Conv(StrBinToHexa, "", 3), "1F");  // a wrong n never reads past the end
   std::mt19937 rng(11);
   for (int round = 0; round < 150; ++round) {
     std::string dec(1 + rng() % (round < 130 ? 60 : 3000), '0');
-    for (size_t i = rng() % 4 ? 0 : rng() % dec.size(); i < dec.size(); ++i) dec[i] = static_cast<char>('0' + rng() % 10);
+    for (size_t i = rng() % 4 ? 0 : rng() % dec.size(); i < dec.size(); ++i)  // some with leading zeros
+      dec[i] = static_cast<char>('0' + rng() % 10);
     std::string bits = Conv(StrDecimalToBin, dec, 4 * dec.size());
     ASSERT_EQ(bits, GmpDecimalToBin(dec)) << dec;
     int n = static_cast<int>(bits.size());

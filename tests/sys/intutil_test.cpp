@@ -26,7 +26,8 @@ TEST(IntLog, LogarithmsAtPowerBoundaries) {
     EXPECT_EQ(IntSupLog2(n), sup) << n;
     EXPECT_EQ(IntInfLog2(n), inf) << n;
   }
-  for (auto [n, sup, inf] : {std::tuple{0, -1, -1}, {1, 0, 0}, {9, 1, 0}, {10, 1, 1}, {1001, 4, 3}, {1000000000, 9, 9}}) {
+  for (auto [n, sup, inf] :
+       {std::tuple{0, -1, -1}, {1, 0, 0}, {9, 1, 0}, {10, 1, 1}, {1001, 4, 3}, {1000000000, 9, 9}}) {
     EXPECT_EQ(IntSupLog10(n), sup) << n;
     EXPECT_EQ(IntInfLog10(n), inf) << n;
   }
