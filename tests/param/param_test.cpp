@@ -11,6 +11,9 @@ TEST(ParamRecord, LimitsCopyAndNoMemory) {
   ParamFree(&p);
   ParamFree(&q);
   EXPECT_TRUE(p == nullptr && ParamCopy(nullptr) == nullptr);
+  p = ParamCreateParam(nullptr, nullptr);
+  EXPECT_EQ(std::string(p->CharParamQual) + p->CharParam, "");
+  ParamFree(&p);
   PortTest::Capture cap;
   EXPECT_EQ(ParamCreateParam((name254 + "n").c_str(), "v"), nullptr);
   EXPECT_EQ(ParamCreateParam("opt", (value1019 + "v").c_str()), nullptr);
@@ -28,16 +31,18 @@ TEST(ParamRecord, LimitsCopyAndNoMemory) {
 TEST(ParamLookup, FindCheckAllowedValuesAndYesNo) {
   DomList* list = MakeList({{"Opt", "SLOW"}, {"opt", "second"}, {"y", "yes"}, {"n", "No"}, {"m", "maybe"}});
   char* in = ParamFindNamedParam(list, "OPT");
-  EXPECT_EQ(ParamFindNamedParam(list, "ofn"), nullptr);
+  EXPECT_TRUE(!ParamFindNamedParam(list, "ofn") && !ParamFindNamedParam(nullptr, "opt"));
   // The first record decides; 2 for no record, 0 for no list.
   EXPECT_EQ(ParamFindParamValue(list, "opt", "slow") * 100 + ParamFindParamValue(list, "opt", "second") * 10 +
                 ParamFindParamValue(list, "speed", "x") + ParamFindParamValue(nullptr, "opt", "SLOW"),
             102);
   EXPECT_EQ(ParamCheckInList(list, 4, "OPT", "y", "N", "m") * 10 + ParamCheckInList(list, 1, "opt"), 10);
   EXPECT_EQ(ParamCheckAtLeastInList(list, 2, "opt", "Opt") * 10 + ParamCheckAtLeastInList(list, 2, "y", "y"), 10);
+  EXPECT_EQ(ParamCheckInList(nullptr, 0) * 10 + ParamCheckAtLeastInList(nullptr, 1, "a"), 10);
   PortTest::Capture cap;
   EXPECT_EQ(ParamCheckParamValue(list, "OPT", nullptr, 2, "fast", "slow"), 2);
   EXPECT_EQ(ParamCheckParamValue(list, "m", nullptr, 2, "fast", "slow"), 0);
+  EXPECT_EQ(ParamCheckParamValue(list, "x", nullptr, 2, "fast", "slow"), 1);  // absent, no default: nothing added
   EXPECT_EQ(ParamCheckParamValue(list, "x", "medium", 2, "fast", "slow"), 0);
   EXPECT_EQ(ParamCheckParamValue(list, "x", "SLOW", 2, "fast", "slow"), 1);  // default added: 1, not the position
   EXPECT_EQ(ParamCheckParamYesNo(list, "Y", 0) * 10 + ParamCheckParamYesNo(list, "n", 1), 10);
@@ -62,9 +67,13 @@ TEST(ParamChange, InPlaceOrMovedToTheEnd) {
   ParamMoveParamName(list, "new", "SPEED");  // no search for the new name
   ParamMoveParamValue(list, "speed", "fast", "slow");
   ParamMoveParamValue(list, "a", "y", "z");
-  EXPECT_EQ(Show(list), "A=x;SPEED=;speed=slow");
-  DomList* to = MakeList({{"A", "X"}, {"m", "2"}, {"k", "1"}});
   PortTest::Capture cap;
+  ParamChangeParamValue(list, "A", std::string(1020, 'v').c_str());
+  ParamMoveParamValue(list, "A", "x", std::string(1020, 'v').c_str());
+  EXPECT_EQ(cap.size(), 2u);
+  cap.clear();
+  EXPECT_EQ(Show(list), "A=x;SPEED=;speed=slow");  // the long values refused
+  DomList* to = MakeList({{"A", "X"}, {"m", "2"}, {"k", "1"}});
   ParamMoveFromList(list, to, "a");  // equal ignoring case: silent
   ParamMoveFromList(list, to, "absent");
   ParamMoveFromList(nullptr, to, "speed");

@@ -37,7 +37,8 @@ TEST(ParamParse, GrammarAndDescriptorAcceptance) {
   EXPECT_EQ(Check("run", "top -depth 3 -v -name \"a b\"", ""), "1 =top;depth=3;v=;name=\"a b\"");
   EXPECT_EQ(Check("Run", "-n -5", ""), "1 n=;5=");
   EXPECT_EQ(Check("kerb", "a \"b c\" - x", "-a 1 2"), "1 =a;=\"b c\";=x");  // descriptors unread
-  EXPECT_EQ(Check("macro", " \t\n", "") + Check("run", "-a 1 2", ""), "1 <null>0 <null>");
+  EXPECT_EQ(Check("macro", " \t\n", "") + Check("ENV", nullptr, "") + Check("run", "-a 1 2", ""),
+            "1 <null>1 <null>0 <null>");
   EXPECT_EQ(Check("run", ("-" + std::string(255, 'n') + " 1").c_str(), ""), "0 <null>");  // name too long
   const char* d = "S -depth I -v";
   EXPECT_EQ(Check("c", "top -depth x", d), "0 =top;depth=x");  // the rejected list stays

@@ -20,8 +20,12 @@ TEST(StrComposeName, ModeTableAndBoundaries) {
     EXPECT_EQ(Compose("src/top.v", "out/", "_x", nullptr, mode), noExt[mode]) << mode;
     EXPECT_EQ(Compose(nullptr, "out/", "_x", "log", mode), "out/_x.log") << mode;
   }
-  EXPECT_EQ(Compose("t.v", "o/", "", "g", 5) + Compose("t.v", nullptr, nullptr, nullptr, 4), "<null><null>");
-  EXPECT_EQ(Compose("top.v", "o/", nullptr, ".log", 0) + Compose(nullptr, "", nullptr, nullptr, 0), "o/top.log");
+  EXPECT_EQ(Compose("t.v", "o/", "", "g", 5) + Compose("t.v", "o/", "", "g", -1) +
+                Compose("t.v", nullptr, nullptr, nullptr, 4),
+            "<null><null><null>");
+  EXPECT_EQ(Compose("top.v", "o/", nullptr, ".log", 0) + "|" + Compose("top.v", "o/", nullptr, "", 0),
+            "o/top.log|o/top.");
+  EXPECT_EQ(Compose(nullptr, "", nullptr, nullptr, 0), "");  // an empty piece is a piece
   EXPECT_EQ(Compose("a.d/top", "o/", nullptr, nullptr, 2), "a.d/o/top");  // a dot in a directory is no extension
   EXPECT_EQ(Compose("a\\b/c.v", "d/", nullptr, nullptr, 0), "d/b/c");  // the backslash wins
   EXPECT_EQ(Owned(StrComposeBaseName("x\\y.z.w/v")) + Owned(StrComposeBaseName("a/")), "y");
