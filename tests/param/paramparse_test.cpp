@@ -39,6 +39,7 @@ TEST(ParamParse, GrammarAndDescriptorAcceptance) {
   EXPECT_EQ(Check("kerb", "a \"b c\" - x", "-a 1 2"), "1 =a;=\"b c\";=x");  // descriptors unread
   EXPECT_EQ(Check("macro", " \t\n", "") + Check("ENV", nullptr, "") + Check("run", "-a 1 2", ""),
             "1 <null>1 <null>0 <null>");
+  PortTest::Capture cap;
   EXPECT_EQ(Check("run", ("-" + std::string(255, 'n') + " 1").c_str(), ""), "0 <null>");  // name too long
   const char* d = "S -depth I -v";
   EXPECT_EQ(Check("c", "top -depth x", d), "0 =top;depth=x");  // the rejected list stays
@@ -48,9 +49,9 @@ TEST(ParamParse, GrammarAndDescriptorAcceptance) {
     outcomes += Check("c", params, d)[0];
   EXPECT_EQ(outcomes + Check("c", "top -depth 3", "S", "-DEPTH I")[0], "10010011");
   EXPECT_EQ(Check("c", "", "-v") + Check("c", "", "S -v") + Check("c", "x", ""), "1 <null>0 <null>0 =x");
-  PortTest::Capture cap;
   EXPECT_EQ(Check("c", "top -unknown 1 -depth -5", d), "1 =top;unknown=1;depth=;5=");
-  EXPECT_EQ(Reports(cap), "1:skipping parameter : unknown\n1:skipping parameter : 5\n");
+  EXPECT_EQ(Reports(cap), "4:Parameter name too long (255 characters, at most 254) : " + std::string(255, 'n') +
+                              "\n1:skipping parameter : unknown\n1:skipping parameter : 5\n");
 }
 
 TEST(ParamTopCheck, ComparesWithAList) {
