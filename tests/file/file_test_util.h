@@ -2,22 +2,27 @@
 #pragma once
 
 #include <filesystem>
+#include <initializer_list>
 #include <string>
 
-#include "duduzu/str.h"
+#include "support/owned.h"
+#include "support/reports.h"
+#include "support/temp_dir.h"
+
+inline std::string Reports(PortTest::Capture& cap) { return Reports(cap, "../s/fileutil"); }
 
 // Number of open descriptors of the process.
 inline int OpenFdCount() {
   int n = 0;
-  for (auto it = std::filesystem::directory_iterator("/proc/self/fd");
-       it != std::filesystem::directory_iterator(); ++it)
+  for (auto it = std::filesystem::directory_iterator("/proc/self/fd"); it != std::filesystem::directory_iterator();
+       ++it)
     ++n;
   return n;
 }
 
-// The heap string's text ("<null>" for null), releasing it.
-inline std::string Owned(char* s) {
-  std::string r = s ? s : "<null>";
-  StrFree(&s);
-  return r;
+// One character per file: '1' when it exists, '0' when not.
+inline std::string Present(std::initializer_list<std::string> names) {
+  std::string s;
+  for (const std::string& name : names) s += Exists(name) ? '1' : '0';
+  return s;
 }

@@ -1,15 +1,16 @@
 // Helpers shared by the parameter tests.
 #pragma once
 
-#include <gtest/gtest.h>
-
 #include <initializer_list>
 #include <string>
 #include <utility>
 
 #include "duduzu/list.h"
 #include "duduzu/param.h"
-#include "port/port_testing.h"
+#include "support/owned.h"
+#include "support/reports.h"
+
+inline std::string Reports(PortTest::Capture& cap) { return Reports(cap, "../s/paramutl"); }
 
 inline void DeleteList(DomList** list) {
   ListDelete(list, [](int** slot) { ParamFree(reinterpret_cast<DomParam**>(slot)); });
@@ -28,24 +29,5 @@ inline std::string Show(DomList* list) {
     auto* p = reinterpret_cast<DomParam*>(list->elements[i]);
     s += (i ? ";" : "") + std::string(p->CharParamQual) + "=" + p->CharParam;
   }
-  return s;
-}
-
-// Takes ownership of a returned heap string.
-inline std::string Owned(char* s) {
-  std::string r = s ? s : "<null>";
-  vzl_free(s);
-  return r;
-}
-
-// The reports since the last call as "level:text" (0 fatal, 1 warning, 2 status, 4 error), all
-// from the parameter unit.
-inline std::string Reports(PortTest::Capture& cap) {
-  std::string s;
-  for (size_t i = 0; i < cap.size(); ++i) {
-    EXPECT_EQ(cap[i].unit, "../s/paramutl");
-    s += std::to_string(static_cast<int>(cap[i].level)) + ":" + cap[i].text;
-  }
-  cap.clear();
   return s;
 }

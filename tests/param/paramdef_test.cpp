@@ -1,46 +1,30 @@
-#include <gtest/gtest.h>
-
-#include <string>
-
 #include "param_test_util.h"
 
-namespace {
-std::string Printed(void (*print)() = ParamDefPrint) {
+TEST(ParamDef, StateSetGetOrderAndPrint) {
   PortTest::Capture cap;
-  print();
-  return Reports(cap);
-}
-}  // namespace
-
-TEST(ParamDef, StateTable) {
   EXPECT_EQ(ParamDefGetInt("x") + ParamDefGetFloat("x"), -2.0f);
   EXPECT_EQ(ParamDefGetStr("x"), nullptr);
-  ParamDefFree();
-  EXPECT_EQ(Printed(ParamDefPrintFormatted) + Printed(), "2:--- Global Param List:\n");  // no list
-  ParamDefSetStr("e", "");  // creates the list, adds nothing
+  ParamDefPrintFormatted();
+  ParamDefPrint();  // no list: the title only
   ParamDefSetStr("a", "1");
   ParamDefFree();
   EXPECT_EQ(ParamDefGetStr("a"), nullptr);
-  ParamDefSetStr("a", "2");
-  EXPECT_EQ(ParamDefGetInt("a"), 2);
-  ParamDefFree();
-}
-
-TEST(ParamDef, SetGetAndOrder) {
   ParamDefSetStr("opt", "12");
   ParamDefSetStr("b", "x");
   ParamDefSetStr("OPT", "7");  // moves to the end with the latest case
-  EXPECT_EQ(Printed(), "2:--- Global Param List:\n2:b\tx\n2:OPT\t7\n");
-  EXPECT_EQ(Printed(ParamDefPrintFormatted), "2:b\tx\n2:OPT\t7\n");
+  ParamDefPrintFormatted();
   ParamDefSetInt("n", 0);
   EXPECT_EQ(Owned(ParamDefGetStr("N")), "0");
-  ParamDefSetInt("n", -1);
+  ParamDefSetInt("n", -1);  // a negative int, a null or empty value: removed
   ParamDefSetStr("b", nullptr);
   ParamDefSetStr("f", "2.5e1");
   EXPECT_EQ(ParamDefGetFloat("f") * 10 + ParamDefGetInt("f"), 252.0f);  // as atof and atoi read it
   ParamDefSetStr("f", "word");
   EXPECT_EQ(ParamDefGetInt("f") + ParamDefGetFloat("f"), 0.0f);
+  EXPECT_EQ(Reports(cap), "2:--- Global Param List:\n2:b\tx\n2:OPT\t7\n");
   ParamDefSetStr("f", std::string(1020, 'v').c_str());  // refused: the old value stays
-  EXPECT_EQ(Printed(), "2:--- Global Param List:\n2:OPT\t7\n2:f\tword\n");
+  cap.clear();
+  ParamDefPrint();
+  EXPECT_EQ(Reports(cap), "2:--- Global Param List:\n2:OPT\t7\n2:f\tword\n");
   ParamDefFree();
 }

@@ -1,20 +1,23 @@
 // Helpers shared by the string tests.
 #pragma once
 
-#include <gtest/gtest.h>
-
 #include <string>
+#include <vector>
 
 #include "duduzu/str.h"
-#include "port/port_testing.h"
+#include "duduzu/strlist.h"
+#include "support/owned.h"
+#include "support/reports.h"
 
-// The capture holds exactly one report, of this level and text, from the string
-// unit; it is emptied for the next check.
-inline void ExpectOneReport(PortTest::Capture& cap, Port_MsgLevel level, const std::string& text) {
-  ASSERT_EQ(cap.size(), 1u);
-  EXPECT_EQ(cap[0].level, level);
-  EXPECT_EQ(cap[0].text, text);
-  EXPECT_EQ(cap[0].unit, "../s/strutil");
-  EXPECT_EQ(cap[0].module, "DuduzuRorez");
-  cap.clear();
+using Strings = std::vector<std::string>;
+
+inline std::string Reports(PortTest::Capture& cap) { return Reports(cap, "../s/strutil"); }
+
+// The strings of a list, which is then released with them; {"<null>"} for no list.
+inline Strings Items(DomList* list) {
+  if (!list) return {"<null>"};
+  char** e = reinterpret_cast<char**>(list->elements);
+  Strings r(e, e + list->count);
+  ListDelete(&list, ListElemFree);
+  return r;
 }

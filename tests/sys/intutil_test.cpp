@@ -3,47 +3,31 @@
 #include <climits>
 #include <cmath>
 #include <cstdint>
-#include <string>
+#include <tuple>
 
 #include "duduzu/intutil.h"
-#include "port/port_testing.h"
+#include "support/owned.h"
+#include "support/reports.h"
 
-namespace {
-
-std::string Owned(char* s) {
-  std::string r = s ? s : "<null>";
-  vzl_free(s);
-  return r;
-}
-
-}  // namespace
-
-TEST(IntCompare, SignedUnsignedAndMembership) {
+TEST(IntCompare, SignedUnsignedMembershipAndPrint) {
   EXPECT_EQ(IntCompare(INT_MIN, INT_MAX) + UnsLessOrEqual(4294967295u, 1), -1);
   DomList* list = ListCreate();
   for (intptr_t v : {5, 9, 12}) ListAddElt(list, reinterpret_cast<int*>(v));
-  EXPECT_EQ(IntMemberOfList(list, 12), 1);  // found third: still 1, not a position
-  EXPECT_EQ(IntMemberOfList(list, 7), 0);
+  EXPECT_EQ(IntMemberOfList(list, 12) * 10 + IntMemberOfList(list, 7), 10);  // found third: 1, not a position
   ListQuickDelete(&list);
-}
-
-TEST(IntPrint, NullStreamIsTheNullMainOutput) {
   PortTest::Capture cap;
-  IntPrint(nullptr, -17);
-  ASSERT_EQ(cap.size(), 1u);
-  EXPECT_EQ(cap[0].level, Port_Status);
-  EXPECT_EQ(cap[0].text, "-17");
-  EXPECT_EQ(cap[0].unit, "../s/intutil");
+  IntPrint(nullptr, -17);  // a null stream is the null main output
+  EXPECT_EQ(Reports(cap, "../s/intutil"), "2:-17");
 }
 
 TEST(IntLog, LogarithmsAtPowerBoundaries) {
   for (auto [n, sup, inf] : {std::tuple{0u, -1, -1}, {1u, 0, 0}, {5u, 3, 2}, {1024u, 10, 10}, {1025u, 11, 10},
-                             {1u << 31, 31, 31}}) {
+                             {1u << 31, 31, 31}, {4294967295u, 32, 31}}) {
     EXPECT_EQ(IntSupLog2(n), sup) << n;
     EXPECT_EQ(IntInfLog2(n), inf) << n;
   }
-  EXPECT_EQ(IntInfLog2(4294967295u), 31);
-  for (auto [n, sup, inf] : {std::tuple{0, -1, -1}, {1, 0, 0}, {9, 1, 0}, {10, 1, 1}, {1001, 4, 3}, {1000000000, 9, 9}}) {
+  for (auto [n, sup, inf] :
+       {std::tuple{0, -1, -1}, {1, 0, 0}, {9, 1, 0}, {10, 1, 1}, {1001, 4, 3}, {1000000000, 9, 9}}) {
     EXPECT_EQ(IntSupLog10(n), sup) << n;
     EXPECT_EQ(IntInfLog10(n), inf) << n;
   }
@@ -51,47 +35,33 @@ TEST(IntLog, LogarithmsAtPowerBoundaries) {
   EXPECT_EQ(IntSupLogk(5, 1), -1);  // no logarithm in base 1: returns at once
   for (auto [x, r] : {std::pair{1.0, 0}, {8.0, 3}, {8.5, 4}, {-3.0, 0}, {NAN, 0}, {INFINITY, 0}})
     EXPECT_EQ(IntSupLog2f(x), r) << x;
-}
-
-TEST(IntBits, PowerOf2AndFirstBit) {
   for (auto [n, yes, exp] : {std::tuple{64, 1, 6u}, {1, 1, 0u}, {1 << 30, 1, 30u}, {96, 0, 0u}, {INT_MIN, 0, 0u}}) {
     unsigned e = 99;
-    EXPECT_EQ(IntIsPowerOf2(n, &e), yes) << n;
-    EXPECT_EQ(e, exp) << n;
+    EXPECT_EQ(IntIsPowerOf2(n, &e) * 100 + e, yes * 100 + exp) << n;
   }
   for (auto [n, bit] : {std::pair{12, 3}, {0, 0}, {INT_MIN, 32}}) EXPECT_EQ(IntLocateFirstBit1(n), bit) << n;
 }
 
-TEST(FloatCompare, DecimalPlacesAndRoundingEdges) {
+TEST(FloatCompare, DecimalPlacesRoundingEdgesAndRoot) {
   EXPECT_EQ(FloatEq(1.234f, 1.236f, 2) + FloatLess(1.234f, 1.236f, 3) + FloatGreat(1.236f, 1.234f, 3), 3);
   EXPECT_EQ(FloatEq(1.234f, 1.236f, 3) + FloatLess(1.234f, 1.236f, 2) + FloatEq(0.0f, 0.5f, 0), 0);
   float a = 1.0f, b = 2.0f, c = 1.4f;
-  EXPECT_EQ(FloatPtrCmp(&a, &b, 1) * 10 + FloatPtrCmp(&b, &a, 0), -9);
-  EXPECT_EQ(FloatPtrCmp(&a, &c, 0), 0);
+  EXPECT_EQ(FloatPtrCmp(&a, &b, 1) * 10 + FloatPtrCmp(&b, &a, 0) + FloatPtrCmp(&a, &c, 0), -9);
   EXPECT_EQ(FloatEq(3.0f, 3.0f, 60), 1);  // the scale overflows; equal stays equal
   // 0.005f lies just below 0.005, yet its product with 100 rounds to 0.5 in
   // single precision: not equal at two places. The float below it is.
-  EXPECT_EQ(FloatEq(0x1.47ae14p-8f, 0.0f, 2), 0);
-  EXPECT_EQ(FloatEq(0x1.47ae12p-8f, 0.0f, 2), 1);
+  EXPECT_EQ(FloatEq(0x1.47ae14p-8f, 0.0f, 2) * 10 + FloatEq(0x1.47ae12p-8f, 0.0f, 2), 1);
   // The scale made by 25 single-precision products exceeds the float nearest
   // 1e25; this difference lies between the two bounds.
-  EXPECT_EQ(FloatEq(0x1.ef2d0ep-85f, 0.0f, 25), 0);
-  EXPECT_EQ(FloatEq(0x1.ef2d0cp-85f, 0.0f, 25), 1);
-}
-
-TEST(FloatRoot, NewtonWithinOneHundredth) {
-  EXPECT_EQ(FloatSquareRoot(-4.0), -1.0);
-  EXPECT_EQ(FloatSquareRoot(0.0), 0.0);
-  for (double x : {4.0, 2.0, 0.25, 12345.678, 1e300})
+  EXPECT_EQ(FloatEq(0x1.ef2d0ep-85f, 0.0f, 25) * 10 + FloatEq(0x1.ef2d0cp-85f, 0.0f, 25), 1);
+  EXPECT_EQ(FloatSquareRoot(-4.0) * 10 + FloatSquareRoot(0.0), -10.0);
+  for (double x : {2.0, 0.25, 12345.678, 1e300})
     EXPECT_NEAR(FloatSquareRoot(x), std::sqrt(x), 0.01 + 1e-12 * std::sqrt(x)) << x;
-  EXPECT_EQ(FloatSquareRoot(INFINITY), INFINITY);
-  EXPECT_TRUE(std::isnan(FloatSquareRoot(NAN)));
+  EXPECT_TRUE(FloatSquareRoot(INFINITY) == INFINITY && std::isnan(FloatSquareRoot(NAN)));
 }
 
 TEST(IntText, QuotedNumbers) {
-  EXPECT_EQ(Owned(IntToHexa(255, 4)), "\"00ff\"");
-  EXPECT_EQ(Owned(IntToHexa(-1, 2)), "\"ffffffff\"");
-  EXPECT_EQ(Owned(IntToStr(-42)), "\"-42\"");
+  EXPECT_EQ(Owned(IntToHexa(255, 4)) + Owned(IntToHexa(-1, 2)) + Owned(IntToStr(-42)), "\"00ff\"\"ffffffff\"\"-42\"");
   EXPECT_EQ(Owned(IntToHexa(0xabc, 5000)), "\"" + std::string(4997, '0') + "abc\"");  // beyond any fixed buffer
   PortTest::AllocFailureGuard guard;
   PortTest::FailNthAlloc(1);
