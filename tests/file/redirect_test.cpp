@@ -26,7 +26,7 @@ void Out(const char* text) {
 }
 
 // The reports so far as "level:text", all from the file unit; clears them.
-std::string Reports(PortTest::Capture& cap) {
+std::string TaggedReports(PortTest::Capture& cap) {
   std::string s;
   for (const Port_Report& r : cap.reports())
     s += (r.unit == "../s/fileutil" ? "" : r.unit) + std::to_string(int(r.level)) + ":" + r.text;
@@ -58,7 +58,7 @@ TEST(SetQelMsgMan, AttachesTheConsoleAndTheLogWithIntegrationStyleOnlyWithALog) 
     WriteFile(log, "old\n");
     PortTest::Capture cap;
     SetQelMsgMan(c.name ? std::string(*c.name).data() : nullptr, c.intStyle, c.noLatch);
-    EXPECT_EQ(Reports(cap), c.reports);
+    EXPECT_EQ(TaggedReports(cap), c.reports);
     EXPECT_EQ(TypesOn(), c.types);
     EXPECT_EQ(Port_MsgDispatcher::getMaxLineWidth(), 1024);
     Qel_Msg::QuietStatus("quiet\n");
@@ -83,7 +83,7 @@ TEST(FileRedirectMainOutFile, NestedFilesTakeEverythingInTurnAndAFailedOneChange
   PortTest::Capture cap;
   EXPECT_TRUE(ExitsToSession([&] { FileRedirectMainOutFile(bad.data()); }));
   EXPECT_EQ(MainEVarReturnStatus, 1);
-  EXPECT_EQ(Reports(cap), "4:Something wrong when opening logfile : " + bad + "\n");
+  EXPECT_EQ(TaggedReports(cap), "4:Something wrong when opening logfile : " + bad + "\n");
   EXPECT_EQ(MainEVarOutFile, tool);
   Say("s0\n");
   FileRedirectMainOutFile(a.data());
@@ -156,7 +156,7 @@ TEST(FileCopyInterf, CopiesIfnToOfnOrSaysWhyNot) {
     for (auto& p : c.params)
       ListAddElt(list, reinterpret_cast<int*>(ParamCreateParam(p.first, p.second.c_str())));
     EXPECT_EQ(FileCopyInterf(list), c.result);
-    EXPECT_EQ(Reports(cap), c.reports);
+    EXPECT_EQ(TaggedReports(cap), c.reports);
     ListDelete(&list, [](int** slot) { ParamFree(reinterpret_cast<DomParam**>(slot)); });
   }
   EXPECT_EQ(ReadFile(dst), "data\n");
