@@ -32,6 +32,9 @@ DUDUZU_API void ListQuickDelete(DomList** list);
 DUDUZU_API void ListDelete(DomList** list, ListFreeFn freeElt);
 DUDUZU_API void ListContextualDelete(DomList** list, ListContextualFreeFn freeElt, int* context);
 DUDUZU_API void ListElemFree(int** slot);
+// Destroys the record pool: every list record still in existence becomes invalid
+// at once (their element arrays are not freed). It is the last step of a session:
+// release the library's own lists first (ParamDefFree, FileRemoveAllFilesInTmp).
 DUDUZU_API void ListKill();
 
 // Adding.
