@@ -5,14 +5,10 @@
 #include <gtest/gtest.h>
 
 #include <cstdint>
-#include <memory>
 #include <random>
-#include <string>
-#include <utility>
-#include <vector>
 
 #include "duduzu/duduzu.h"
-#include "port/port_testing.h"
+#include "support/reports.h"
 
 using Vals = std::vector<long>;
 using Calls = std::vector<std::pair<long, long>>;
@@ -44,14 +40,10 @@ using Shape = std::pair<Vals, int>;
 inline Shape ShapeOf(const DomList* list) { return {Of(list), list->capacity}; }
 
 // Exactly these reports, each of `level` and of the list unit.
-inline void ExpectReports(const PortTest::Capture& cap, Port_MsgLevel level,
-                          const std::vector<std::string>& texts) {
-  ASSERT_EQ(cap.size(), texts.size());
-  for (size_t i = 0; i < texts.size(); ++i) {
-    EXPECT_EQ(cap[i].level, level);
-    EXPECT_EQ(cap[i].unit, "../s/listutil");
-    EXPECT_EQ(cap[i].text, texts[i]);
-  }
+inline void ExpectReports(PortTest::Capture& cap, Port_MsgLevel level, const std::vector<std::string>& texts) {
+  std::string want;
+  for (const std::string& text : texts) want += std::to_string(level) + ":" + text;
+  EXPECT_EQ(Reports(cap, "../s/listutil"), want);
 }
 
 // The recording callbacks append (first argument, second argument) to `calls`.

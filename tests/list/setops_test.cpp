@@ -10,15 +10,14 @@ namespace {
 
 int CtxEq(int* x, int* v, int*) { return Eq(x, v); }
 int* Plus100(int* e) { return P(V(e) + 100); }
-int* CtxPlus100(int* e, int* context) { return lastContext = context, Plus100(e); }
 bool Has(const Vals& v, long x) { return std::find(v.begin(), v.end(), x) != v.end(); }
 
 TEST(ListSetOps, AgreeWithReferencesOnRandomLists) {
   std::mt19937 rng(4);
-  for (int round = 0; round < 200; ++round) {
-    long range = 1 + rng() % 60;  // b often equals a as a set or as a multiset
+  for (int round = 0; round < 80; ++round) {
+    long range = 1 + rng() % 30;  // b often equals a as a set or as a multiset
     auto values = [&] {
-      Vals v(rng() % 121);
+      Vals v(rng() % 41);
       for (long& x : v) x = 1 + static_cast<long>(rng() % range);
       return v;
     };
@@ -38,44 +37,35 @@ TEST(ListSetOps, AgreeWithReferencesOnRandomLists) {
       if (!Has(a, y)) uni.push_back(y);
       if (!Has(grown, y)) grown.push_back(y);
     }
-    size_t dup = 0;  // the first element with a later match
-    while (dup < a.size() && !Has(Vals(a.begin() + static_cast<long>(dup) + 1, a.end()), a[dup])) ++dup;
-    bool unique = distinct.size() == a.size();
-
+    int dup = 0;  // the first element with a later match
+    while (dup < static_cast<int>(a.size()) && std::count(a.begin() + dup, a.end(), a[dup]) == 1) ++dup;
+    int unique = distinct.size() == a.size();
     Owned la = Make(a), lb = Make(b), into = Make(a), dedup = Make(a);
-    EXPECT_EQ(ListIdentical(la.get(), lb.get(), Eq), sa == sb);
-    EXPECT_EQ(ListIncludeInList(la.get(), lb.get(), Eq), std::includes(sa.begin(), sa.end(), sb.begin(), sb.end()));
-    EXPECT_EQ(ListIdenticalQuick(la.get(), Make(b).get(), Eq, 0), ma == mb);
-    EXPECT_EQ(Take(ListIntersectionNoEltCr(la.get(), lb.get(), Eq)), inter);
-    EXPECT_EQ(Take(ListUnionNoEltCr(la.get(), lb.get(), Eq)), uni);
-    EXPECT_EQ(Take(ListComplement(la.get(), lb.get(), Eq)), comp);
     DomList* raw = into.get();
     ListUnionNoEltCrNoLCr(&raw, lb.get(), Eq);
-    EXPECT_EQ(Of(into.get()), grown);
-    EXPECT_EQ(ListContextualCheckNoDuplication(la.get(), CtxEq, nullptr), unique);
-    EXPECT_EQ(ListSortedCheckNoDuplication(Make(ma).get(), Eq), unique);
-    EXPECT_EQ(ListSearchDuplication(la.get(), Eq), unique ? 0 : static_cast<int>(dup) + 1);
     ListRemoveDuplicElem(dedup.get(), Eq);
-    EXPECT_EQ(Of(dedup.get()), distinct);
+    EXPECT_EQ((std::vector<Vals>{Take(ListIntersectionNoEltCr(la.get(), lb.get(), Eq)), Take(ListUnionNoEltCr(la.get(), lb.get(), Eq)),
+                                 Take(ListComplement(la.get(), lb.get(), Eq)), Of(into.get()), Of(dedup.get())}),
+              (std::vector<Vals>{inter, uni, comp, grown, distinct}));
+    EXPECT_EQ((Ints{ListIdentical(la.get(), lb.get(), Eq), ListIncludeInList(la.get(), lb.get(), Eq),
+                    ListIdenticalQuick(la.get(), Make(b).get(), Eq, 0), ListContextualCheckNoDuplication(la.get(), CtxEq, nullptr),
+                    ListSortedCheckNoDuplication(Make(ma).get(), Eq), ListSearchDuplication(la.get(), Eq)}),
+              (Ints{sa == sb, std::includes(sa.begin(), sa.end(), sb.begin(), sb.end()), ma == mb, unique, unique, unique ? 0 : dup + 1}));
     EXPECT_EQ(Of(la.get()), a);  // untouched so far
     int same = ListIdenticalQuick(la.get(), lb.get(), Eq, 1);
     EXPECT_EQ(same, sa == sb);
-    if (same) {
-      EXPECT_EQ(Of(la.get()), distinct);  // repeats dropped from a, all of b consumed
-      EXPECT_EQ(lb->count, 0);
-    }
+    EXPECT_TRUE(!same || (Of(la.get()) == distinct && lb->count == 0));  // repeats dropped from a, all of b consumed
   }
 }
 
 TEST(ListSetOps, EmptyListsAndCallbackArgumentOrder) {
-  Owned empty = Make({}), x = Make({7});
+  Owned empty = Make({}), x = Make({7}), a = Make({1, 2}), b = Make({2, 1});
   EXPECT_EQ((Ints{ListIdentical(nullptr, empty.get(), Eq), ListContextualIdentical(empty.get(), nullptr, CtxEq, nullptr),
                   ListIdentical(x.get(), nullptr, Eq), ListIncludeInList(nullptr, empty.get(), Eq),
                   ListIncludeInList(nullptr, x.get(), Eq), ListCheckNoDuplication(nullptr, Eq),
                   ListSortedCheckNoDuplication(nullptr, Eq)}),
             (Ints{1, 1, 0, 1, 0, 1, 1}));
   int context;
-  Owned a = Make({1, 2}), b = Make({2, 1});
   EXPECT_EQ(Recorded([&] { ListContextualIdentical(a.get(), b.get(), CtxEqRec, &context); }),
             (Calls{{2, 1}, {1, 1}, {2, 2}, {1, 2}, {2, 2}, {1, 1}}));
   EXPECT_EQ(lastContext, &context);
@@ -98,10 +88,7 @@ TEST(ListSetOps, SingleElementsAndReleaseOfDuplicates) {
   ListAddEltNoDupl(list.get(), P(4), Eq);
   EXPECT_EQ(Of(list.get()), (Vals{2, 1, 4}));
   DomList* heap = ListCreate();  // ASan reports a leaked or twice-freed element
-  for (int v : {4, 5, 4, 4, 5, 6}) {
-    ListAddElt(heap, static_cast<int*>(vzl_malloc(sizeof(int))));
-    *heap->elements[heap->count - 1] = v;
-  }
+  for (int v : {4, 5, 4, 4, 5, 6}) ListAddElt(heap, new (vzl_malloc(sizeof(int))) int(v));
   int* kept[] = {heap->elements[0], heap->elements[1], heap->elements[5]};
   ListRemoveFreeDuplicElem(heap, HeapEq, ListElemFree);
   ASSERT_EQ(heap->count, 3);
@@ -110,14 +97,13 @@ TEST(ListSetOps, SingleElementsAndReleaseOfDuplicates) {
 }
 
 TEST(ListSetOps, NullEmptyResultsCapacitiesAndCopies) {
-  Owned x = Make({1}), y = Make({2}), yy = Make({2, 2}), empty = Make({});
+  Owned x = Make({1}), y = Make({2}), yy = Make({2, 2}), empty = Make({}), a = Make({1, 2, 3}), b = Make({3, 1}), r;
   for (DomList* none : {ListIntersectionNoEltCr(x.get(), nullptr, Eq), ListIntersectionNoEltCr(x.get(), y.get(), Eq),
                         ListContextualIntersectionNoEltCr(nullptr, x.get(), CtxEq, nullptr),
                         ListUnionNoEltCr(empty.get(), nullptr, Eq), ListUnion(empty.get(), empty.get(), Eq, Plus100),
                         ListInverseNoEltCr(empty.get()), ListComplement(nullptr, empty.get(), Eq)})
     EXPECT_EQ(none, nullptr);
-  for (DomList* c : {ListComplement(x.get(), x.get(), Eq), ListComplement(nullptr, x.get(), Eq),
-                     ListContextualComplement(nullptr, nullptr, CtxEq, nullptr)})
+  for (DomList* c : {ListComplement(x.get(), x.get(), Eq), ListContextualComplement(nullptr, nullptr, CtxEq, nullptr)})
     EXPECT_EQ(ShapeOf(Owned(c).get()), Shape({}, 16));
   EXPECT_EQ(ShapeOf(Owned(ListComplement(x.get(), empty.get(), Eq)).get()), Shape({1}, 1));  // a copy of a
   EXPECT_EQ(ShapeOf(Owned(ListUnionNoEltCr(x.get(), yy.get(), Eq)).get()), Shape({1, 2, 2}, 4));
@@ -125,11 +111,11 @@ TEST(ListSetOps, NullEmptyResultsCapacitiesAndCopies) {
   DomList* grown = nullptr;
   ListUnionNoEltCrNoLCr(&grown, yy.get(), Eq);  // a null *a becomes a copy of b
   EXPECT_EQ(Take(grown), (Vals{2, 2}));
-  Owned a = Make({1, 2, 3}), b = Make({3, 1}), r;
   EXPECT_EQ(Take(ListUnion(a.get(), Make({4, 2}).get(), Eq, Plus100)), (Vals{101, 102, 103, 104}));
   int context;
   EXPECT_EQ(Recorded([&] {
-              r.reset(ListContextualIntersectionWithEltCr(a.get(), b.get(), CtxEqRec, CtxPlus100, &context));
+              r.reset(ListContextualIntersectionWithEltCr(a.get(), b.get(), CtxEqRec,
+                                                          [](int* e, int* c) { return lastContext = c, Plus100(e); }, &context));
             }),
             (Calls{{3, 1}, {1, 1}, {3, 2}, {1, 2}, {3, 3}}));
   EXPECT_EQ(lastContext, &context);
@@ -138,12 +124,11 @@ TEST(ListSetOps, NullEmptyResultsCapacitiesAndCopies) {
 }
 
 int Value(int* e) { return static_cast<int>(V(e)); }
-int CtxValue(int* e, int* context) { return Value(e) * *context; }
 
 TEST(ListSetOps, SumsExtremesAndPairs) {
   int three = 3;
   EXPECT_EQ((Ints{ListEltSum(nullptr, Value), ListEltSum(Make({INT_MAX, 1, 2}).get(), Value),
-                  ListContextualEltSum(Make({1, 2}).get(), CtxValue, &three)}),
+                  ListContextualEltSum(Make({1, 2}).get(), [](int* e, int* c) { return Value(e) * *c; }, &three)}),
             (Ints{0, INT_MIN + 2, 9}));  // wrapping like 32-bit arithmetic
   Owned list = Make({3000, 7000, 7001, 1000});
   EXPECT_EQ(V(ListMaxMinElt(list.get(), 0, Cmp)), 7000);  // ties keep the earlier
