@@ -4,8 +4,6 @@
 #include "listtest.h"
 #include "support/session_test.h"
 
-namespace {
-
 Vals freed;
 void RecordFree(int** slot) { freed.push_back(V(*slot)), *slot = nullptr; }
 
@@ -23,7 +21,9 @@ TEST(ListCore, GrowthOnlyDoublesAndSetReallocNullsTheGap) {
   EXPECT_EQ(ShapeOf(grown.get()), Shape(want, 64));
 }
 
-TEST(ListCore, InsertAtEveryValidPositionAndRefuseOthers) {
+int SameParity(int* x, int* v) { return (V(x) & 1) == (V(v) & 1); }
+
+TEST(ListCore, InsertionMembershipAndCompaction) {
   Owned list = Make({1, 2}), full = Make({1}, 1);
   PortTest::Capture cap;
   EXPECT_EQ((Ints{ListInsertInList(list.get(), P(7), 2), ListInsertInList(list.get(), P(8), 4),
@@ -58,18 +58,14 @@ TEST(ListCore, RemovalsShiftOrFillFromTheEndAndCheckTheIndex) {
   EXPECT_EQ(freed, (Vals{2, 4, 2, 3}));
 }
 
-int SameParity(int* x, int* v) { return (V(x) & 1) == (V(v) & 1); }
 
 TEST(ListCore, MembershipAndCompaction) {
   Owned list = Make({10, 20, 10, -5});
-  int ctx;
   EXPECT_EQ((Ints{ListMemberOfList(list.get(), P(10)), ListMemberOfList(list.get(), P(99)),
                   ListMemberOfList(nullptr, P(10)), ListMemberOfList(list.get(), P(3), SameParity),
                   ListMemberOfListInt(list.get(), -5), ListMemberOfListInt(nullptr, 10)}),
             (Ints{1, 0, 0, 4, 4, 0}));
-  EXPECT_EQ(Recorded([&] { EXPECT_EQ(ListContextualMemberOfList(list.get(), P(20), CtxEqRec, &ctx), 2); }),
-            (Calls{{10, 20}, {20, 20}}));
-  EXPECT_EQ(lastContext, &ctx);
+  EXPECT_EQ(Recorded([&] { EXPECT_EQ(ListMemberOfList(list.get(), P(20), EqRec), 2); }), (Calls{{10, 20}, {20, 20}}));
   list = Make({1, 0, 2, 0});
   EXPECT_EQ((Ints{ListCompact(list.get()), ListCompact(nullptr)}), (Ints{2, 0}));
   EXPECT_EQ(ShapeOf(list.get()), Shape({1, 2}, 16));
@@ -77,10 +73,8 @@ TEST(ListCore, MembershipAndCompaction) {
 
 int* Double(int* e) { return P(V(e) * 2); }
 
-TEST(ListCore, CopiesAndJoins) {
-  int ten = 10;
+TEST(ListCore, CopiesJoinsAndDeletion) {
   Owned src = Make({1, 2, 3}), copy(ListCopy(src.get(), Double)), shared(ListCopyNoEltCr(src.get()));
-  EXPECT_EQ(Take(ListContextualCopy(src.get(), [](int* e, int* c) { return P(V(e) + *c); }, &ten)), (Vals{11, 12, 13}));
   EXPECT_EQ(ShapeOf(copy.get()), Shape({2, 4, 6}, 3));  // sized to the source
   EXPECT_EQ(ShapeOf(Owned(ListCopy(Make({}).get(), Double)).get()), Shape({}, 1));
   EXPECT_NE(shared->elements, src->elements);
@@ -93,22 +87,15 @@ TEST(ListCore, CopiesAndJoins) {
   ListAppend(copy.get(), &moved);  // LeakSanitizer checks that the source is released
   EXPECT_EQ(moved, nullptr);
   ListAppend(copy.get(), &moved);  // null sources add nothing
-  ListAdd(copy.get(), nullptr, Double);
   ListAddNoEltCr(copy.get(), nullptr);
   EXPECT_EQ(ShapeOf(copy.get()), Shape({2, 4, 6, 2, 4, 6, 1, 2, 3}, 12));
-}
-
-TEST(ListCore, DeleteFreesEverySlotInOrder) {
-  DomList* list = ListCreate();
-  for (int i = 0; i < 3; ++i) ListAddElt(list, static_cast<int*>(vzl_malloc(8)));
-  ListDelete(&list, ListElemFree);  // LeakSanitizer checks every element
-  ListDelete(&list, ListElemFree);  // null: nothing
-  static long seen = 0;
-  list = Make({4, 5}).release();
+  static long seen = 0;  // deletion visits every slot in order; ListDelete frees: see the duplicate tests
   int ctx = 42;
-  ListContextualDelete(&list, [](int** slot, int* c) { seen = seen * 100 + V(*slot) + *c; }, &ctx);
+  ListContextualDelete(&moved, nullptr, &ctx);  // null: nothing
+  moved = Make({4, 5}).release();
+  ListContextualDelete(&moved, [](int** slot, int* c) { seen = seen * 100 + V(*slot) + *c; }, &ctx);
   EXPECT_EQ(seen, 4647);
-  EXPECT_EQ(list, nullptr);
+  EXPECT_EQ(moved, nullptr);
 }
 
 TEST(ListCore, RecordReuseCreationAndGrowthFailures) {
@@ -129,14 +116,13 @@ TEST(ListCore, RecordReuseCreationAndGrowthFailures) {
   grown = Make(Vals(16, 1)).release();
   cap.clear();
   PortTest::FailAllAllocs();
-  for (void (*grow)() : {+[] { ListAddElt(grown, P(9)); }, +[] { ListSetRealloc(grown, P(9), INT_MAX); },
-                         +[] { ListInsertInList(grown, P(9), 1); }}) {
+  for (void (*grow)() : {+[] { ListAddElt(grown, P(9)); }, +[] { ListSetRealloc(grown, P(9), INT_MAX); }}) {
     MainEVarReturnStatus = 0;
     EXPECT_TRUE(ExitsToSession(grow));
     EXPECT_EQ(MainEVarReturnStatus, 3);
   }
   const char* growth = "Data corruption (ListAddElt) - Memory Full\n";
-  ExpectReports(cap, Port_Fatal, {growth, growth, growth});
+  ExpectReports(cap, Port_Fatal, {growth, growth});
   EXPECT_EQ(ShapeOf(grown), Shape(Vals(16, 1), 16));
   PortTest::ResetAllocFailures();
   ListQuickDelete(&grown);
@@ -149,7 +135,6 @@ TEST(ListCore, PrintSeparatesElementsByTheMainOutputRuleAndDisplayDumps) {
   PortTest::Capture cap;
   Owned list = Make({1, 2, 3});
   ListPrint(stdout, list.get(), [](FILE*, int* e) { printed += std::to_string(V(e)); }, ", ");
-  ListPrint(stdout, Make({}).get(), nullptr, ", ");
   ListPrint(stdout, nullptr, nullptr, ", ");
   int ctx = 0;
   ListContextualPrint(stdout, list.get(), [](FILE*, int*, int* c) { ++*c; }, "/", &ctx);
@@ -159,8 +144,5 @@ TEST(ListCore, PrintSeparatesElementsByTheMainOutputRuleAndDisplayDumps) {
   testing::internal::CaptureStdout();
   ListDisplay(list.get());
   std::string text = testing::internal::GetCapturedStdout();
-  EXPECT_EQ(text.rfind("Taille 16, Elt 2, Adresse ", 0), 0u);
-  EXPECT_NE(text.find("\n      1f       2\n"), std::string::npos);
+  EXPECT_EQ(text.substr(0, 26) + text.substr(text.find('\n')), "Taille 16, Elt 2, Adresse \n      1f       2\n");
 }
-
-}  // namespace

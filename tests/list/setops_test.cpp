@@ -6,8 +6,6 @@
 
 #include "listtest.h"
 
-namespace {
-
 int CtxEq(int* x, int* v, int*) { return Eq(x, v); }
 int* Plus100(int* e) { return P(V(e) + 100); }
 bool Has(const Vals& v, long x) { return std::find(v.begin(), v.end(), x) != v.end(); }
@@ -16,45 +14,29 @@ TEST(ListSetOps, AgreeWithReferencesOnRandomLists) {
   std::mt19937 rng(4);
   for (int round = 0; round < 80; ++round) {
     long range = 1 + rng() % 30;  // b often equals a as a set or as a multiset
-    auto values = [&] {
-      Vals v(rng() % 41);
-      for (long& x : v) x = 1 + static_cast<long>(rng() % range);
-      return v;
-    };
-    Vals a = values(), b = a;
+    Vals a(rng() % 41), b, distinct, inter, comp, uni;
+    for (long& x : a) x = 1 + static_cast<long>(rng() % range);
+    b = uni = a;
     std::shuffle(b.begin(), b.end(), rng);
     if (rng() % 2 && !a.empty()) b.push_back(a[rng() % a.size()]);
-    if (rng() % 3 == 0) b = values();
+    if (rng() % 3 == 0) for (long& y : b) y = 1 + static_cast<long>(rng() % range);
     std::set<long> sa(a.begin(), a.end()), sb(b.begin(), b.end());
-    Vals ma = a, mb = b, distinct, inter, comp, uni = a, grown = a;
-    std::sort(ma.begin(), ma.end());
-    std::sort(mb.begin(), mb.end());
-    for (long x : a) {
-      if (!Has(distinct, x)) distinct.push_back(x);
-      (Has(b, x) ? inter : comp).push_back(x);
-    }
-    for (long y : b) {
-      if (!Has(a, y)) uni.push_back(y);
-      if (!Has(grown, y)) grown.push_back(y);
-    }
+    std::multiset<long> ma(a.begin(), a.end()), mb(b.begin(), b.end());
+    for (long x : a) (Has(b, x) ? inter : comp).push_back(x), Has(distinct, x) ? void() : distinct.push_back(x);
+    std::copy_if(b.begin(), b.end(), std::back_inserter(uni), [&](long y) { return !Has(a, y); });
     int dup = 0;  // the first element with a later match
     while (dup < static_cast<int>(a.size()) && std::count(a.begin() + dup, a.end(), a[dup]) == 1) ++dup;
-    int unique = distinct.size() == a.size();
-    Owned la = Make(a), lb = Make(b), into = Make(a), dedup = Make(a);
-    DomList* raw = into.get();
-    ListUnionNoEltCrNoLCr(&raw, lb.get(), Eq);
+    Owned la = Make(a), lb = Make(b), dedup = Make(a);
     ListRemoveDuplicElem(dedup.get(), Eq);
     EXPECT_EQ((std::vector<Vals>{Take(ListIntersectionNoEltCr(la.get(), lb.get(), Eq)), Take(ListUnionNoEltCr(la.get(), lb.get(), Eq)),
-                                 Take(ListComplement(la.get(), lb.get(), Eq)), Of(into.get()), Of(dedup.get())}),
-              (std::vector<Vals>{inter, uni, comp, grown, distinct}));
+                                 Take(ListComplement(la.get(), lb.get(), Eq)), Of(dedup.get())}),
+              (std::vector<Vals>{inter, uni, comp, distinct}));
     EXPECT_EQ((Ints{ListIdentical(la.get(), lb.get(), Eq), ListIncludeInList(la.get(), lb.get(), Eq),
-                    ListIdenticalQuick(la.get(), Make(b).get(), Eq, 0), ListContextualCheckNoDuplication(la.get(), CtxEq, nullptr),
-                    ListSortedCheckNoDuplication(Make(ma).get(), Eq), ListSearchDuplication(la.get(), Eq)}),
-              (Ints{sa == sb, std::includes(sa.begin(), sa.end(), sb.begin(), sb.end()), ma == mb, unique, unique, unique ? 0 : dup + 1}));
-    EXPECT_EQ(Of(la.get()), a);  // untouched so far
-    int same = ListIdenticalQuick(la.get(), lb.get(), Eq, 1);
-    EXPECT_EQ(same, sa == sb);
-    EXPECT_TRUE(!same || (Of(la.get()) == distinct && lb->count == 0));  // repeats dropped from a, all of b consumed
+                    ListIdenticalQuick(la.get(), Make(b).get(), Eq, 0), ListCheckNoDuplication(la.get(), Eq), ListSearchDuplication(la.get(), Eq)}),
+              (Ints{sa == sb, std::includes(sa.begin(), sa.end(), sb.begin(), sb.end()), ma == mb, dup == int(a.size()),
+                    dup == int(a.size()) ? 0 : dup + 1}));
+    EXPECT_EQ(ListIdenticalQuick(la.get(), lb.get(), Eq, 1), sa == sb);  // a untouched until here
+    EXPECT_TRUE(sa != sb || (Of(la.get()) == distinct && lb->count == 0));  // repeats dropped from a, all of b consumed
   }
 }
 
@@ -80,8 +62,9 @@ TEST(ListSetOps, EmptyListsAndCallbackArgumentOrder) {
 }
 
 int HeapEq(int* x, int* v) { return *x == *v; }
+int Value(int* e) { return static_cast<int>(V(e)); }
 
-TEST(ListSetOps, SingleElementsAndReleaseOfDuplicates) {
+TEST(ListSetOps, SingleElementsReleaseOfDuplicatesSumsExtremesAndPairs) {
   Owned list = Make({1, 2, 1});
   EXPECT_EQ(ListRemoveElt(list.get(), P(1), Eq) * 10 + ListRemoveElt(list.get(), P(5), Eq), 10);
   ListAddEltNoDupl(list.get(), P(2), Eq);
@@ -94,20 +77,33 @@ TEST(ListSetOps, SingleElementsAndReleaseOfDuplicates) {
   ASSERT_EQ(heap->count, 3);
   EXPECT_TRUE(std::equal(kept, kept + 3, heap->elements));
   ListDelete(&heap, ListElemFree);
+  ListDelete(&heap, ListElemFree);  // null: nothing
+  int three = 3;
+  EXPECT_EQ((Ints{ListEltSum(nullptr, Value), ListEltSum(Make({INT_MAX, 1, 2}).get(), Value),
+                  ListContextualEltSum(Make({1, 2}).get(), [](int* e, int* c) { return Value(e) * *c; }, &three)}),
+            (Ints{0, INT_MIN + 2, 9}));  // wrapping like 32-bit arithmetic
+  list = Make({3000, 7000, 7001, 1000});
+  EXPECT_EQ(V(ListMaxMinElt(list.get(), 0, Cmp)), 7000);  // ties keep the earlier
+  EXPECT_EQ(Recorded([&] { EXPECT_EQ(V(ListMaxMinElt(list.get(), 1, CmpRec)), 1000); }),
+            (Calls{{7000, 3000}, {7001, 3000}, {1000, 3000}}));
+  EXPECT_TRUE(Recorded([&] { EXPECT_EQ(V(ListMaxMinElt(list.get(), 2, CmpRec)), 3000); }).empty());
+  EXPECT_EQ(ListMaxMinElt(nullptr, 0, Cmp), nullptr);
+  list = Make({10, 11, 20, 21});
+  EXPECT_EQ(Recorded([&] { EXPECT_EQ(ListMemberOfDoubleList(list.get(), P(20), EqRec), 3); }),
+            (Calls{{10, 20}, {20, 20}}));
+  EXPECT_EQ(ListMemberOfDoubleList(list.get(), P(11), Eq) + ListMemberOfDoubleList(nullptr, P(11), Eq), 0);
 }
 
 TEST(ListSetOps, NullEmptyResultsCapacitiesAndCopies) {
   Owned x = Make({1}), y = Make({2}), yy = Make({2, 2}), empty = Make({}), a = Make({1, 2, 3}), b = Make({3, 1}), r;
   for (DomList* none : {ListIntersectionNoEltCr(x.get(), nullptr, Eq), ListIntersectionNoEltCr(x.get(), y.get(), Eq),
-                        ListContextualIntersectionNoEltCr(nullptr, x.get(), CtxEq, nullptr),
+                        ListIntersectionNoEltCr(nullptr, x.get(), Eq),
                         ListUnionNoEltCr(empty.get(), nullptr, Eq), ListUnion(empty.get(), empty.get(), Eq, Plus100),
                         ListInverseNoEltCr(empty.get()), ListComplement(nullptr, empty.get(), Eq)})
     EXPECT_EQ(none, nullptr);
-  for (DomList* c : {ListComplement(x.get(), x.get(), Eq), ListContextualComplement(nullptr, nullptr, CtxEq, nullptr)})
-    EXPECT_EQ(ShapeOf(Owned(c).get()), Shape({}, 16));
+  EXPECT_EQ(ShapeOf(Owned(ListComplement(x.get(), x.get(), Eq)).get()), Shape({}, 16));
   EXPECT_EQ(ShapeOf(Owned(ListComplement(x.get(), empty.get(), Eq)).get()), Shape({1}, 1));  // a copy of a
   EXPECT_EQ(ShapeOf(Owned(ListUnionNoEltCr(x.get(), yy.get(), Eq)).get()), Shape({1, 2, 2}, 4));
-  EXPECT_EQ(Take(ListContextualUnionNoEltCr(nullptr, yy.get(), CtxEq, nullptr)), (Vals{2, 2}));
   DomList* grown = nullptr;
   ListUnionNoEltCrNoLCr(&grown, yy.get(), Eq);  // a null *a becomes a copy of b
   EXPECT_EQ(Take(grown), (Vals{2, 2}));
@@ -123,23 +119,3 @@ TEST(ListSetOps, NullEmptyResultsCapacitiesAndCopies) {
   EXPECT_EQ(ShapeOf(Owned(ListInverseNoEltCr(a.get())).get()), Shape({3, 2, 1}, 16));
 }
 
-int Value(int* e) { return static_cast<int>(V(e)); }
-
-TEST(ListSetOps, SumsExtremesAndPairs) {
-  int three = 3;
-  EXPECT_EQ((Ints{ListEltSum(nullptr, Value), ListEltSum(Make({INT_MAX, 1, 2}).get(), Value),
-                  ListContextualEltSum(Make({1, 2}).get(), [](int* e, int* c) { return Value(e) * *c; }, &three)}),
-            (Ints{0, INT_MIN + 2, 9}));  // wrapping like 32-bit arithmetic
-  Owned list = Make({3000, 7000, 7001, 1000});
-  EXPECT_EQ(V(ListMaxMinElt(list.get(), 0, Cmp)), 7000);  // ties keep the earlier
-  EXPECT_EQ(Recorded([&] { EXPECT_EQ(V(ListMaxMinElt(list.get(), 1, CmpRec)), 1000); }),
-            (Calls{{7000, 3000}, {7001, 3000}, {1000, 3000}}));
-  EXPECT_TRUE(Recorded([&] { EXPECT_EQ(V(ListMaxMinElt(list.get(), 2, CmpRec)), 3000); }).empty());
-  EXPECT_EQ(ListMaxMinElt(nullptr, 0, Cmp), nullptr);
-  list = Make({10, 11, 20, 21});
-  EXPECT_EQ(Recorded([&] { EXPECT_EQ(ListMemberOfDoubleList(list.get(), P(20), EqRec), 3); }),
-            (Calls{{10, 20}, {20, 20}}));
-  EXPECT_EQ(ListMemberOfDoubleList(list.get(), P(11), Eq) + ListMemberOfDoubleList(nullptr, P(11), Eq), 0);
-}
-
-}  // namespace
