@@ -7,46 +7,14 @@
 Vals freed;
 void RecordFree(int** slot) { freed.push_back(V(*slot)), *slot = nullptr; }
 
-TEST(ListCore, GrowthOnlyDoublesAndSetReallocNullsTheGap) {
-  Owned tiny(ListCreateWithSize(0)), grown = Make(Vals{1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, 13, 14, 15, 16, 17});
-  EXPECT_EQ(tiny->elements[0], nullptr);
-  for (int i = 1; i <= 3; ++i) ListAddElt(tiny.get(), P(i));
-  EXPECT_EQ((Ints{tiny->capacity, grown->capacity}), (Ints{4, 32}));  // 1, 2, 4 and 16, 32
-  Vals want = Of(grown.get());
-  want.resize(41);
-  ListSetRealloc(grown.get(), P(want[40] = 9), 40);  // slots 17 to 39 become null
-  PortTest::Capture cap;
-  ListSetRealloc(grown.get(), P(1), -1);
-  ExpectReports(cap, Port_Fatal, {"Data corruption (ListAddElt) - Negative index\n"});
-  EXPECT_EQ(ShapeOf(grown.get()), Shape(want, 64));
-}
-
-int SameParity(int* x, int* v) { return (V(x) & 1) == (V(v) & 1); }
-
-TEST(ListCore, InsertionMembershipAndCompaction) {
-  Owned list = Make({1, 2}), full = Make({1}, 1);
-  PortTest::Capture cap;
-  EXPECT_EQ((Ints{ListInsertInList(list.get(), P(7), 2), ListInsertInList(list.get(), P(8), 4),
-                  ListInsertInList(list.get(), P(9), 1), ListInsertInList(full.get(), P(2), 1),
-                  ListInsertInList(list.get(), P(5), 0), ListInsertInList(list.get(), P(5), 7),
-                  ListInsertInList(nullptr, P(5), 1)}),
-            (Ints{1, 1, 1, 1, 0, 0, 0}));
-  const char* refused = "in ListInsertInList !!\n\n";
-  ExpectReports(cap, Port_Error, {refused, refused, refused});
-  EXPECT_EQ(Of(list.get()), (Vals{9, 1, 7, 2, 8}));
-  EXPECT_EQ(ShapeOf(full.get()), Shape({2, 1}, 2));  // a full array grows
-}
-
 TEST(ListCore, RemovalsShiftOrFillFromTheEndAndCheckTheIndex) {
   using Remove = int (*)(DomList*, int);
-  const std::tuple<const char*, Remove, Vals> removals[] = {
-      {"Data corruption (ListDelShift) - Bad Index\n", ListDelShift, {1, 3}},
-      {"Data corruption (ListDelShiftFree) - Bad Index\n",
-       [](DomList* l, int pos) { return ListDelShiftFree(l, pos, RecordFree); }, {1, 3}},
-      {"Data corruption (ListDelInsert) - Bad Index\n", ListDelInsert, {1, 4}},
-      {"Data corruption (ListDelInsertFree) - Bad Index\n",
-       [](DomList* l, int pos) { return ListDelInsertFree(l, pos, RecordFree); }, {1, 4}}};
-  for (const auto& [text, remove, after] : removals) {
+  const std::tuple<std::string, Remove, Vals> removals[] = {
+      {"ListDelShift", ListDelShift, {1, 3}}, {"ListDelInsert", ListDelInsert, {1, 4}},
+      {"ListDelShiftFree", [](DomList* l, int pos) { return ListDelShiftFree(l, pos, RecordFree); }, {1, 3}},
+      {"ListDelInsertFree", [](DomList* l, int pos) { return ListDelInsertFree(l, pos, RecordFree); }, {1, 4}}};
+  for (const auto& [name, remove, after] : removals) {
+    const std::string text = "Data corruption (" + name + ") - Bad Index\n";
     Owned list = Make({1, 2, 3, 4});
     PortTest::Capture cap;
     EXPECT_EQ(remove(list.get(), 0) + remove(list.get(), -3) + remove(nullptr, 0), 3) << text;  // no-ops
@@ -58,9 +26,32 @@ TEST(ListCore, RemovalsShiftOrFillFromTheEndAndCheckTheIndex) {
   EXPECT_EQ(freed, (Vals{2, 4, 2, 3}));
 }
 
+int SameParity(int* x, int* v) { return (V(x) & 1) == (V(v) & 1); }
 
-TEST(ListCore, MembershipAndCompaction) {
-  Owned list = Make({10, 20, 10, -5});
+TEST(ListCore, GrowthInsertionMembershipAndCompaction) {  // growth only doubles; ListSetRealloc nulls the gap
+  Owned tiny(ListCreateWithSize(0)), grown = Make(Vals{1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, 13, 14, 15, 16, 17});
+  EXPECT_EQ(tiny->elements[0], nullptr);
+  for (int i = 1; i <= 3; ++i) ListAddElt(tiny.get(), P(i));
+  EXPECT_EQ((Ints{tiny->capacity, grown->capacity}), (Ints{4, 32}));  // 1, 2, 4 and 16, 32
+  Vals want = Of(grown.get());
+  want.resize(41);
+  ListSetRealloc(grown.get(), P(want[40] = 9), 40);  // slots 17 to 39 become null
+  PortTest::Capture cap;
+  ListSetRealloc(grown.get(), P(1), -1);
+  ExpectReports(cap, Port_Fatal, {"Data corruption (ListAddElt) - Negative index\n"});
+  EXPECT_EQ(ShapeOf(grown.get()), Shape(want, 64));
+  Owned list = Make({1, 2}), full = Make({1}, 1);
+  EXPECT_EQ((Ints{ListInsertInList(list.get(), P(7), 2), ListInsertInList(list.get(), P(8), 4),
+                  ListInsertInList(list.get(), P(9), 1), ListInsertInList(full.get(), P(2), 1),
+                  ListInsertInList(list.get(), P(5), 0), ListInsertInList(list.get(), P(5), 7),
+                  ListInsertInList(nullptr, P(5), 1)}),
+            (Ints{1, 1, 1, 1, 0, 0, 0}));
+  const char* refused = "in ListInsertInList !!\n\n";
+  ExpectReports(cap, Port_Error, {refused, refused, refused});
+  EXPECT_EQ(Of(list.get()), (Vals{9, 1, 7, 2, 8}));
+  EXPECT_EQ(ShapeOf(full.get()), Shape({2, 1}, 2));  // a full array grows
+
+  list = Make({10, 20, 10, -5});
   EXPECT_EQ((Ints{ListMemberOfList(list.get(), P(10)), ListMemberOfList(list.get(), P(99)),
                   ListMemberOfList(nullptr, P(10)), ListMemberOfList(list.get(), P(3), SameParity),
                   ListMemberOfListInt(list.get(), -5), ListMemberOfListInt(nullptr, 10)}),
@@ -80,7 +71,6 @@ TEST(ListCore, CopiesJoinsAndDeletion) {
   EXPECT_NE(shared->elements, src->elements);
   EXPECT_TRUE(ListCopy(nullptr, Double) == nullptr && ListCopyNoEltCr(nullptr) == nullptr);
   ListAdd(copy.get(), src.get(), Double);
-  EXPECT_EQ(copy->capacity, 6);
   ListAddNoEltCr(src.get(), src.get());  // a list joined to itself
   EXPECT_EQ(Of(src.get()), (Vals{1, 2, 3, 1, 2, 3}));
   DomList* moved = shared.release();
@@ -114,15 +104,13 @@ TEST(ListCore, RecordReuseCreationAndGrowthFailures) {
   ExpectReports(cap, Port_Fatal, {full, full, "Data corruption (ListCreateWithSize) - Negative index\n"});
   static DomList* grown;  // a fresh pool after the kill; growth failure ends the session with code 3
   grown = Make(Vals(16, 1)).release();
-  cap.clear();
   PortTest::FailAllAllocs();
   for (void (*grow)() : {+[] { ListAddElt(grown, P(9)); }, +[] { ListSetRealloc(grown, P(9), INT_MAX); }}) {
     MainEVarReturnStatus = 0;
     EXPECT_TRUE(ExitsToSession(grow));
     EXPECT_EQ(MainEVarReturnStatus, 3);
   }
-  const char* growth = "Data corruption (ListAddElt) - Memory Full\n";
-  ExpectReports(cap, Port_Fatal, {growth, growth});
+  ExpectReports(cap, Port_Fatal, {"Data corruption (ListAddElt) - Memory Full\n", "Data corruption (ListAddElt) - Memory Full\n"});
   EXPECT_EQ(ShapeOf(grown), Shape(Vals(16, 1), 16));
   PortTest::ResetAllocFailures();
   ListQuickDelete(&grown);
@@ -130,7 +118,7 @@ TEST(ListCore, RecordReuseCreationAndGrowthFailures) {
 
 std::string printed;
 
-TEST(ListCore, PrintSeparatesElementsByTheMainOutputRuleAndDisplayDumps) {
+TEST(ListCore, PrintSeparatesElementsByTheMainOutputRule) {
   MainEVarOutFile = stdout;
   PortTest::Capture cap;
   Owned list = Make({1, 2, 3});
@@ -140,9 +128,4 @@ TEST(ListCore, PrintSeparatesElementsByTheMainOutputRuleAndDisplayDumps) {
   ListContextualPrint(stdout, list.get(), [](FILE*, int*, int* c) { ++*c; }, "/", &ctx);
   EXPECT_EQ(printed + std::to_string(ctx) + cap.text(Port_Status) + std::to_string(cap.size()), "1233, , //4");
   MainEVarOutFile = nullptr;
-  list = Make({0x1f, 0x2});
-  testing::internal::CaptureStdout();
-  ListDisplay(list.get());
-  std::string text = testing::internal::GetCapturedStdout();
-  EXPECT_EQ(text.substr(0, 26) + text.substr(text.find('\n')), "Taille 16, Elt 2, Adresse \n      1f       2\n");
 }

@@ -17,9 +17,7 @@ using Ints = std::vector<int>;  // several results compared at once
 inline int* P(long v) { return reinterpret_cast<int*>(static_cast<intptr_t>(v)); }
 inline long V(const int* p) { return static_cast<long>(reinterpret_cast<intptr_t>(p)); }
 
-struct ListDeleter {
-  void operator()(DomList* list) const { ListQuickDelete(&list); }
-};
+struct ListDeleter { void operator()(DomList* list) const { ListQuickDelete(&list); } };
 using Owned = std::unique_ptr<DomList, ListDeleter>;
 
 inline Owned Make(const Vals& values, int size = 16) {
