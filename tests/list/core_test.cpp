@@ -1,15 +1,12 @@
 // List core: growth, removal, search, compaction, copies, printing, failures.
-#include <climits>
-
 #include "listtest.h"
 #include "support/session_test.h"
 
 Vals freed;
 void RecordFree(int** slot) { freed.push_back(V(*slot)), *slot = nullptr; }
 
-TEST(ListCore, RemovalsShiftOrFillFromTheEndAndCheckTheIndex) {
-  using Remove = int (*)(DomList*, int);
-  const std::tuple<std::string, Remove, Vals> removals[] = {
+TEST(ListCore, RemovalsCreationAndGrowthFailures) {
+  const std::tuple<std::string, int (*)(DomList*, int), Vals> removals[] = {
       {"ListDelShift", ListDelShift, {1, 3}}, {"ListDelInsert", ListDelInsert, {1, 4}},
       {"ListDelShiftFree", [](DomList* l, int pos) { return ListDelShiftFree(l, pos, RecordFree); }, {1, 3}},
       {"ListDelInsertFree", [](DomList* l, int pos) { return ListDelInsertFree(l, pos, RecordFree); }, {1, 4}}};
@@ -24,6 +21,31 @@ TEST(ListCore, RemovalsShiftOrFillFromTheEndAndCheckTheIndex) {
     EXPECT_EQ(Of(list.get()), after) << text;
   }
   EXPECT_EQ(freed, (Vals{2, 4, 2, 3}));
+  PortTest::AllocFailureGuard guard;
+  DomList *list = ListCreate(), *first = list;
+  ListQuickDelete(&list);
+  PortTest::Capture cap;
+  PortTest::FailNthAlloc(1);  // the element array: the record goes back to the pool
+  EXPECT_EQ(ListCreateWithSize(4), nullptr);
+  EXPECT_EQ(Owned(ListCreate()).get(), first);  // the last released record comes back first
+  ListKill();
+  PortTest::FailNthAlloc(1);  // the record pool itself
+  EXPECT_EQ(ListCreate(), nullptr);
+  EXPECT_EQ(ListCreateWithSize(-1), nullptr);
+  const char* full = "Data corruption (ListCreateWithSize) - Memory Full\n";
+  ExpectReports(cap, Port_Fatal, {full, full, "Data corruption (ListCreateWithSize) - Negative index\n"});
+  static DomList* grown;  // a fresh pool after the kill; growth failure ends the session with code 3
+  grown = Make(Vals(16, 1)).release();
+  PortTest::FailAllAllocs();
+  for (void (*grow)() : {+[] { ListAddElt(grown, P(9)); }, +[] { ListSetRealloc(grown, P(9), INT_MAX); }}) {
+    MainEVarReturnStatus = 0;
+    EXPECT_TRUE(ExitsToSession(grow));
+    EXPECT_EQ(MainEVarReturnStatus, 3);
+  }
+  ExpectReports(cap, Port_Fatal, {"Data corruption (ListAddElt) - Memory Full\n", "Data corruption (ListAddElt) - Memory Full\n"});
+  EXPECT_EQ(ShapeOf(grown), Shape(Vals(16, 1), 16));
+  PortTest::ResetAllocFailures();
+  ListQuickDelete(&grown);
 }
 
 int SameParity(int* x, int* v) { return (V(x) & 1) == (V(v) & 1); }
@@ -63,13 +85,13 @@ TEST(ListCore, GrowthInsertionMembershipAndCompaction) {  // growth only doubles
 }
 
 int* Double(int* e) { return P(V(e) * 2); }
+std::string printed;
 
-TEST(ListCore, CopiesJoinsAndDeletion) {
+TEST(ListCore, CopiesJoinsDeletionAndPrinting) {  // printing separates elements by the main-output rule
   Owned src = Make({1, 2, 3}), copy(ListCopy(src.get(), Double)), shared(ListCopyNoEltCr(src.get()));
   EXPECT_EQ(ShapeOf(copy.get()), Shape({2, 4, 6}, 3));  // sized to the source
   EXPECT_EQ(ShapeOf(Owned(ListCopy(Make({}).get(), Double)).get()), Shape({}, 1));
-  EXPECT_NE(shared->elements, src->elements);
-  EXPECT_TRUE(ListCopy(nullptr, Double) == nullptr && ListCopyNoEltCr(nullptr) == nullptr);
+  EXPECT_TRUE(shared->elements != src->elements && ListCopy(nullptr, Double) == nullptr && ListCopyNoEltCr(nullptr) == nullptr);
   ListAdd(copy.get(), src.get(), Double);
   ListAddNoEltCr(src.get(), src.get());  // a list joined to itself
   EXPECT_EQ(Of(src.get()), (Vals{1, 2, 3, 1, 2, 3}));
@@ -81,51 +103,17 @@ TEST(ListCore, CopiesJoinsAndDeletion) {
   EXPECT_EQ(ShapeOf(copy.get()), Shape({2, 4, 6, 2, 4, 6, 1, 2, 3}, 12));
   static long seen = 0;  // deletion visits every slot in order; ListDelete frees: see the duplicate tests
   int ctx = 42;
-  ListContextualDelete(&moved, nullptr, &ctx);  // null: nothing
   moved = Make({4, 5}).release();
   ListContextualDelete(&moved, [](int** slot, int* c) { seen = seen * 100 + V(*slot) + *c; }, &ctx);
   EXPECT_EQ(seen, 4647);
   EXPECT_EQ(moved, nullptr);
-}
-
-TEST(ListCore, RecordReuseCreationAndGrowthFailures) {
-  PortTest::AllocFailureGuard guard;
-  DomList *list = ListCreate(), *first = list;
-  ListQuickDelete(&list);
-  PortTest::Capture cap;
-  PortTest::FailNthAlloc(1);  // the element array: the record goes back to the pool
-  EXPECT_EQ(ListCreateWithSize(4), nullptr);
-  EXPECT_EQ(Owned(ListCreate()).get(), first);  // the last released record comes back first
-  ListKill();
-  PortTest::FailNthAlloc(1);  // the record pool itself
-  EXPECT_EQ(ListCreate(), nullptr);
-  EXPECT_EQ(ListCreateWithSize(-1), nullptr);
-  const char* full = "Data corruption (ListCreateWithSize) - Memory Full\n";
-  ExpectReports(cap, Port_Fatal, {full, full, "Data corruption (ListCreateWithSize) - Negative index\n"});
-  static DomList* grown;  // a fresh pool after the kill; growth failure ends the session with code 3
-  grown = Make(Vals(16, 1)).release();
-  PortTest::FailAllAllocs();
-  for (void (*grow)() : {+[] { ListAddElt(grown, P(9)); }, +[] { ListSetRealloc(grown, P(9), INT_MAX); }}) {
-    MainEVarReturnStatus = 0;
-    EXPECT_TRUE(ExitsToSession(grow));
-    EXPECT_EQ(MainEVarReturnStatus, 3);
-  }
-  ExpectReports(cap, Port_Fatal, {"Data corruption (ListAddElt) - Memory Full\n", "Data corruption (ListAddElt) - Memory Full\n"});
-  EXPECT_EQ(ShapeOf(grown), Shape(Vals(16, 1), 16));
-  PortTest::ResetAllocFailures();
-  ListQuickDelete(&grown);
-}
-
-std::string printed;
-
-TEST(ListCore, PrintSeparatesElementsByTheMainOutputRule) {
   MainEVarOutFile = stdout;
   PortTest::Capture cap;
-  Owned list = Make({1, 2, 3});
-  ListPrint(stdout, list.get(), [](FILE*, int* e) { printed += std::to_string(V(e)); }, ", ");
+  ListPrint(stdout, src.get(), [](FILE*, int* e) { printed += std::to_string(V(e)); }, ", ");
   ListPrint(stdout, nullptr, nullptr, ", ");
-  int ctx = 0;
-  ListContextualPrint(stdout, list.get(), [](FILE*, int*, int* c) { ++*c; }, "/", &ctx);
-  EXPECT_EQ(printed + std::to_string(ctx) + cap.text(Port_Status) + std::to_string(cap.size()), "1233, , //4");
+  ctx = 0;
+  ListContextualPrint(stdout, src.get(), [](FILE*, int*, int* c) { ++*c; }, "/", &ctx);
+  EXPECT_EQ(printed + std::to_string(ctx) + cap.text(Port_Status) + std::to_string(cap.size()), "1231236, , , , , /////10");
   MainEVarOutFile = nullptr;
 }
+

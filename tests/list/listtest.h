@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 
+#include <climits>
 #include <cstdint>
 #include <random>
 
@@ -60,8 +61,7 @@ inline int CtxCmpRec(int* a, int* b, int* context) { return lastContext = contex
 
 // Up to maxSize values key * 1000 + id: keys from 1 to range, ids firstId, firstId + 1, ...
 inline Vals Keyed(std::mt19937& rng, int maxSize, long range, long firstId = 0) {
-  std::uniform_int_distribution<long> key(1, range);
   Vals out(rng() % static_cast<unsigned>(maxSize + 1));
-  for (size_t i = 0; i < out.size(); ++i) out[i] = key(rng) * 1000 + firstId + static_cast<long>(i);
+  for (size_t i = 0; i < out.size(); ++i) out[i] = static_cast<long>(1 + rng() % range) * 1000 + firstId + static_cast<long>(i);
   return out;
 }
