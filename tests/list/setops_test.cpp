@@ -91,7 +91,7 @@ TEST(ListSetOps, NullAndEmptyListsCapacitiesAndCallbackArgumentOrder) {
                   ListContextualEltSum(Make({1, 2}).get(), [](int* e, int* c) { return Value(e) * *c; }, &three)}),
             (Ints{0, INT_MIN + 2, 9}));  // wrapping like 32-bit arithmetic
   list = Make({3000, 7000, 7001, 1000});
-  EXPECT_EQ((Vals{V(ListMaxMinElt(list.get(), 0, Cmp)), V(ListMaxMinElt(nullptr, 0, Cmp))}), (Vals{7000, 0}));  // ties keep the earlier
+  EXPECT_EQ((Vals{V(ListMaxMinElt(list.get(), 0, Cmp)), V(ListMaxMinElt(nullptr, 0, Cmp))}), (Vals{7000, 0}));  // ties: the earlier
   EXPECT_EQ(Recorded([&] { EXPECT_EQ(V(ListMaxMinElt(list.get(), 1, CmpRec)), 1000); }),
             (Calls{{7000, 3000}, {7001, 3000}, {1000, 3000}}));
   EXPECT_TRUE(Recorded([&] { EXPECT_EQ(V(ListMaxMinElt(list.get(), 2, CmpRec)), 3000); }).empty());
