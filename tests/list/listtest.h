@@ -4,15 +4,12 @@
 
 #include <gtest/gtest.h>
 
+#include <climits>
 #include <cstdint>
-#include <memory>
 #include <random>
-#include <string>
-#include <utility>
-#include <vector>
 
 #include "duduzu/duduzu.h"
-#include "port/port_testing.h"
+#include "support/reports.h"
 
 using Vals = std::vector<long>;
 using Calls = std::vector<std::pair<long, long>>;
@@ -21,9 +18,7 @@ using Ints = std::vector<int>;  // several results compared at once
 inline int* P(long v) { return reinterpret_cast<int*>(static_cast<intptr_t>(v)); }
 inline long V(const int* p) { return static_cast<long>(reinterpret_cast<intptr_t>(p)); }
 
-struct ListDeleter {
-  void operator()(DomList* list) const { ListQuickDelete(&list); }
-};
+struct ListDeleter { void operator()(DomList* list) const { ListQuickDelete(&list); } };
 using Owned = std::unique_ptr<DomList, ListDeleter>;
 
 inline Owned Make(const Vals& values, int size = 16) {
@@ -44,14 +39,10 @@ using Shape = std::pair<Vals, int>;
 inline Shape ShapeOf(const DomList* list) { return {Of(list), list->capacity}; }
 
 // Exactly these reports, each of `level` and of the list unit.
-inline void ExpectReports(const PortTest::Capture& cap, Port_MsgLevel level,
-                          const std::vector<std::string>& texts) {
-  ASSERT_EQ(cap.size(), texts.size());
-  for (size_t i = 0; i < texts.size(); ++i) {
-    EXPECT_EQ(cap[i].level, level);
-    EXPECT_EQ(cap[i].unit, "../s/listutil");
-    EXPECT_EQ(cap[i].text, texts[i]);
-  }
+inline void ExpectReports(PortTest::Capture& cap, Port_MsgLevel level, const std::vector<std::string>& texts) {
+  std::string want;
+  for (const std::string& text : texts) want += std::to_string(level) + ":" + text;
+  EXPECT_EQ(Reports(cap, "../s/listutil"), want);
 }
 
 // The recording callbacks append (first argument, second argument) to `calls`.
@@ -70,8 +61,7 @@ inline int CtxCmpRec(int* a, int* b, int* context) { return lastContext = contex
 
 // Up to maxSize values key * 1000 + id: keys from 1 to range, ids firstId, firstId + 1, ...
 inline Vals Keyed(std::mt19937& rng, int maxSize, long range, long firstId = 0) {
-  std::uniform_int_distribution<long> key(1, range);
   Vals out(rng() % static_cast<unsigned>(maxSize + 1));
-  for (size_t i = 0; i < out.size(); ++i) out[i] = key(rng) * 1000 + firstId + static_cast<long>(i);
+  for (size_t i = 0; i < out.size(); ++i) out[i] = static_cast<long>(1 + rng() % range) * 1000 + firstId + static_cast<long>(i);
   return out;
 }

@@ -2,17 +2,14 @@
 #pragma once
 
 #include <gmp.h>
-#include <gtest/gtest.h>
-
-#include <cctype>
-#include <cstdio>
 #include <cstdlib>
 #include <random>
-#include <string>
+#include <utility>
 #include <vector>
 
 #include "duduzu/session.h"
-#include "port/port_testing.h"
+#include "support/reports.h"
+#include "support/temp_dir.h"
 
 using Cells = std::vector<unsigned int>;
 using Mints = std::vector<Cells>;  // several results compared at once
@@ -20,8 +17,7 @@ using Mints = std::vector<Cells>;  // several results compared at once
 // The first `cells` cells of a created Mint, which is then released.
 inline Cells take(unsigned int* m, int cells) {
   Cells v(m, m + cells);
-  vzl_free(m);
-  return v;
+  return vzl_free(m), v;
 }
 
 inline Cells randomCells(std::mt19937& rng, int cells) {
@@ -39,10 +35,9 @@ struct Mpz {
   }
   ~Mpz() { mpz_clear(z); }
   std::string text(int base) const {  // upper-case digits
-    char* s = mpz_get_str(nullptr, base, z);
+    char* s = mpz_get_str(nullptr, -base, z);
     std::string t(s);
     free(s);
-    for (char& c : t) c = static_cast<char>(toupper(c));
     return t;
   }
 };
@@ -53,30 +48,27 @@ template <class F>
 std::string printed(F print, size_t* reports = nullptr) {
   FILE* s = tmpfile();
   print(s);
-  rewind(s);
-  std::string text;
-  for (int c; (c = fgetc(s)) != EOF;) text += static_cast<char>(c);
+  std::string text = StreamText(s);
   fclose(s);
   if (!reports) return text;
   PortTest::Capture cap;
-  FILE* saved = MainEVarOutFile;
-  MainEVarOutFile = stderr;
+  FILE* saved = std::exchange(MainEVarOutFile, stderr);
   print(MainEVarOutFile);
   MainEVarOutFile = saved;
-  for (const Port_Report& r : cap.reports()) {
-    EXPECT_EQ(r.level, Port_Status);
-    EXPECT_EQ(r.unit, "../s/multint");
-  }
+  for (const Port_Report& r : cap.reports()) EXPECT_EQ(std::to_string(r.level) + r.unit, "2../s/multint");
   EXPECT_EQ(cap.text(), text);
   *reports = cap.size();
   return text;
 }
 
-// Exactly one error report "Memory Full (Function <creator>)\n" of the unit.
-inline void expectMemoryFull(const PortTest::Capture& cap, const std::string& creator) {
-  ASSERT_EQ(cap.size(), 1u) << creator;
-  EXPECT_EQ(cap[0].level, Port_Error);
-  EXPECT_EQ(cap[0].module, "DuduzuRorez");
-  EXPECT_EQ(cap[0].unit, "../s/multint");
-  EXPECT_EQ(cap[0].text, "Memory Full (Function " + creator + ")\n");
+// What `f` returns when the next allocation fails; its reports must be exactly
+// "Memory Full (Function <creator>)\n" of the unit (none for an empty creator).
+template <class F>
+auto failing(const std::string& creator, F f) {
+  PortTest::AllocFailureGuard guard;
+  PortTest::Capture cap;
+  PortTest::FailNthAlloc(1);
+  auto result = f();
+  EXPECT_EQ(Reports(cap, "../s/multint"), creator.empty() ? "" : "4:Memory Full (Function " + creator + ")\n");
+  return result;
 }
