@@ -12,6 +12,9 @@
 
 inline std::string Reports(PortTest::Capture& cap) { return Reports(cap, "../s/fileutil"); }
 
+// The flag word of a stream, as a failed close reports it.
+inline std::string Flags(FILE* f) { return std::to_string(static_cast<int16_t>(f->_flags)); }
+
 // Number of open descriptors of the process.
 inline long OpenFdCount() { return std::distance(std::filesystem::directory_iterator("/proc/self/fd"), {}); }
 

@@ -43,13 +43,13 @@ TEST(SetQelMsgMan, AttachesTheConsoleAndTheLogWithIntegrationStyleOnlyWithALog) 
   }
 }
 
-TEST(FileRedirectMainOutFile, NestedFilesTakeEverythingInTurnAndAFailedOneChangesNothing) {
+TEST(FileRedirectMainOutFile, NestedFilesTakeEverythingInTurnAFailedOneChangesNothingAndRestoreFilters) {
   TempDir dir;
   std::string setup = dir / "setup.log", a = dir / "a.log", b = dir / "b.log", bad = dir / "no/x.log";
   WriteFile(a, "old\n");
   FILE* tool = MainEVarOutFile = tmpfile();
   int fds = OpenFdCount();
-  SetQelMsgMan(setup.data(), false, false);
+  SetQelMsgMan(setup.data(), true, false);  // integration style: the console filtered
   PortTest::Capture cap;
   EXPECT_TRUE(ExitsToSession([&] { FileRedirectMainOutFile(bad.data()); }) && MainEVarOutFile == tool);
   EXPECT_EQ(std::to_string(MainEVarReturnStatus) + Reports(cap), "14:Something wrong when opening logfile : " + bad + "\n");
@@ -65,29 +65,20 @@ TEST(FileRedirectMainOutFile, NestedFilesTakeEverythingInTurnAndAFailedOneChange
   EXPECT_EQ(TypesOn(), "f012345678");  // the console waits for the outer restore
   Say("a2\n");
   FileRestoreOldMainOutFile();
-  EXPECT_EQ(TypesOn(), "c012345678 f012345678");
+  EXPECT_EQ(TypesOn(), "c04568 f012345678");  // filtered again
   Say("s1\n");
   FileRestoreOldMainOutFile();  // nothing left to restore: the tool's stream stays open
   Out("t\n");
+  Qel_Msg::QuietEnableScreen();  // then a restore leaves the console unfiltered
+  FileRedirectMainOutFile(b.data());
+  FileRestoreOldMainOutFile();
+  EXPECT_EQ(TypesOn(), "c012345678 f012345678");
   UnsetQelMsgMan();
   EXPECT_EQ(OpenFdCount(), fds);
   EXPECT_EQ(ReadFile(setup), "ERROR:DuduzuRorez - Something wrong when opening logfile : " + bad + "\ns0\ns1\n");
   EXPECT_EQ(ReadFile(a), "old\na-out\na1\na2\n");
   EXPECT_EQ(ReadFile(b), "b1\nb-out\n");
   EXPECT_EQ(StreamText(tool), "t\n");
-}
-
-TEST(FileRestoreOldMainOutFile, IntegrationStyleFiltersTheConsoleAgainUnlessQuietScreenIsOpen) {
-  TempDir dir;
-  std::string setup = dir / "setup.log", a = dir / "a.log";
-  SetQelMsgMan(setup.data(), true, false);
-  for (const char* types : {"c04568 f012345678", "c012345678 f012345678"}) {
-    FileRedirectMainOutFile(a.data());
-    FileRestoreOldMainOutFile();
-    EXPECT_EQ(TypesOn(), types);
-    Qel_Msg::QuietEnableScreen();  // the second time round
-  }
-  UnsetQelMsgMan();
 }
 
 TEST(FileCopyInterf, CopiesIfnToOfnOrSaysWhyNot) {
