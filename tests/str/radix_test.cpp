@@ -15,7 +15,7 @@ static std::string Conv(void (*fn)(const char*, char*, N...), const std::string&
 
 // Random decimals of any length against GMP (binary text padded with zeros to the
 // decimal length); their bits back through octal and hexadecimal digits.
-TEST(RadixConvert, DecimalMatchesGmpAndBitsRoundTrip) {
+TEST(Radix, DecimalMatchesGmpBitsRoundTripChecksAndLimits) {
   EXPECT_EQ(Conv(StrDecimalToBin, "", 4) + Conv(StrDecimalToBin, "007", 12) + Conv(StrHexaToBin, "Aa", 8),
             "11110101010");
   EXPECT_EQ(Conv(StrBinToHexa, "11111", 5, 0) + Conv(StrBinToHexa, "", 0, 3), "1F");  // a wrong n never reads past the end
@@ -37,13 +37,9 @@ TEST(RadixConvert, DecimalMatchesGmpAndBitsRoundTrip) {
   PortTest::AllocFailureGuard guard;
   PortTest::FailNthAlloc(1);
   EXPECT_EQ(Conv(StrDecimalToBin, "12", 4), "");  // no working memory: empty text, no crash
-}
-
-TEST(RadixCheck, SizedFormsLimitsReportsAndBitRuns) {
   for (const char* s : {"101", "4'b1010", "'B", "", "4'b"}) EXPECT_EQ(StrIsBinary(s), 1) << s;
   for (const char* s : {"102", "4'h1", "a'b1", "1'b'1"}) EXPECT_EQ(StrIsBinary(s), 0) << s;
-  EXPECT_EQ(StrIsHexa("8'hfF") + StrIsHexa("DEAD") + StrIsOctal("8") + StrIsDecimal("1 2"), 2);
-  for (const char* s : {"8'hG", "8h'F", "4'd9", "8'o7"}) EXPECT_EQ(StrIsHexa(s) + StrIsOctal(s), 0) << s;
+  EXPECT_EQ(StrIsHexa("8'hfF") + StrIsHexa("DEAD") + StrIsHexa("8'hG") + StrIsOctal("8") + StrIsDecimal("1 2"), 2);
   PortTest::Capture cap;
   unsigned out = 7;
   EXPECT_EQ(StrToUInt(&out, C("4294967295")), 1);
