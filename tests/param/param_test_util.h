@@ -7,7 +7,7 @@
 
 inline std::string Reports(PortTest::Capture& cap) { return Reports(cap, "../s/paramutl"); }
 
-inline void DeleteList(DomList** list) { ListDelete(list, [](int** e) { ParamFree(reinterpret_cast<DomParam**>(e)); }); }
+inline void DeleteList(DomList** l) { ListDelete(l, [](int** e) { ParamFree(reinterpret_cast<DomParam**>(e)); }); }
 
 inline DomList* MakeList(std::initializer_list<std::pair<const char*, const char*>> records) {
   DomList* list = ListCreate();

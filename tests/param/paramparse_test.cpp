@@ -39,7 +39,8 @@ TEST(ParamParse, GrammarDescriptorAcceptanceAndTopCheck) {
        {"top -depth 3 -v", "-depth 3", "top extra", "top -depth", "top -v 1", "top -v -v", "top -v -V", "top -depth x"})
     outcomes += Check("c", params, d)[0];
   outcomes += Check("c", "top -depth 3", "S", "-DEPTH I")[0];
-  EXPECT_EQ(Check("c", "", "-v") + Check("c", "", "S -v") + Check("c", "x", ""), "1 <null>0 <null>0 =x");  // a rejected list stays
+  // A rejected list stays.
+  EXPECT_EQ(Check("c", "", "-v") + Check("c", "", "S -v") + Check("c", "x", ""), "1 <null>0 <null>0 =x");
   EXPECT_EQ(Check("c", "top -unknown 1 -depth -5", d), "1 =top;unknown=1;depth=;5=");
   DomList* list = MakeList({{"opt", "Fast"}, {"v", ""}});  // the top check: the list's names first, then the others
   for (const char* params : {"-v -OPT fast", "", "-a 1 2", "-other 1 -opt slow", "-opt fast -other 1"})

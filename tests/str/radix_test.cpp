@@ -18,7 +18,7 @@ static std::string Conv(void (*fn)(const char*, char*, N...), const std::string&
 TEST(Radix, DecimalMatchesGmpBitsRoundTripChecksAndLimits) {
   EXPECT_EQ(Conv(StrDecimalToBin, "", 4) + Conv(StrDecimalToBin, "007", 12) + Conv(StrHexaToBin, "Aa", 8),
             "11110101010");
-  EXPECT_EQ(Conv(StrBinToHexa, "11111", 5, 0) + Conv(StrBinToHexa, "", 0, 3), "1F");  // a wrong n never reads past the end
+  EXPECT_EQ(Conv(StrBinToHexa, "11111", 5, 0) + Conv(StrBinToHexa, "", 0, 3), "1F");  // a wrong n: no read past the end
   std::mt19937 rng(11);
   for (int round = 0; round < 60; ++round) {
     std::string dec(1 + rng() % (round < 50 ? 60 : 3000), '0');

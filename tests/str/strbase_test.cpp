@@ -15,8 +15,8 @@ TEST(StrBase, CompareEditReadNameAndSafeCats) {
   char buf[16] = "fix";
   StrLeftCat(C("pre"), buf);  // overlapping move to the right
   EXPECT_EQ(buf + std::string(StrChrSlash("a\\b/c")), "prefix\\b/c");  // a backslash wins over a later slash
-  auto undouble = [](const char* in) { char* p = C(in); StrRemoveDoubleSlash(&p); return std::string(p); };
-  EXPECT_EQ(undouble("a/b//c/d") + "|" + undouble("//abc") + "|" + undouble("abc") + "|" + undouble("a//"), "c/d|abc|abc|");
+  auto cut = [](const char* in) { char* p = C(in); StrRemoveDoubleSlash(&p); return std::string(p); };
+  EXPECT_EQ(cut("a/b//c/d") + "|" + cut("//abc") + "|" + cut("abc") + "|" + cut("a//"), "c/d|abc|abc|");
   for (auto [n, digits] : {std::pair{9, 1}, {10, 2}, {2147483647, 10}, {-1, -1}}) EXPECT_EQ(StrIntNbOfChar(n), digits);
   FILE* f = tmpfile();
   fputs(" abcdefgh\tx", f);

@@ -27,7 +27,7 @@ TEST(StrList, FieldsTokensQuotedWordsFindInsertPrintAndIndexedNames) {
   PortTest::AllocFailureGuard guard;
   for (long n = 1; n <= 6; ++n) {  // work copy, element array, three words, then none
     PortTest::FailNthAlloc(n);
-    EXPECT_EQ(Items(StrToWordList("set \"a  b\" c", " ")), n <= 5 ? Strings{"<null>"} : Strings({"set", "\"a b\"", "c"}));
+    EXPECT_EQ(Items(StrToWordList("s \"a  b\" c", " ")), n <= 5 ? Strings{"<null>"} : Strings({"s", "\"a b\"", "c"}));
   }
   PortTest::ResetAllocFailures();
   auto nice = [](const std::string& items, int width) {
