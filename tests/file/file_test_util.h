@@ -3,6 +3,7 @@
 
 #include <filesystem>
 #include <initializer_list>
+#include <iterator>
 #include <string>
 
 #include "support/owned.h"
@@ -11,14 +12,11 @@
 
 inline std::string Reports(PortTest::Capture& cap) { return Reports(cap, "../s/fileutil"); }
 
+// The flag word of a stream, as a failed close reports it.
+inline std::string Flags(FILE* f) { return std::to_string(static_cast<int16_t>(f->_flags)); }
+
 // Number of open descriptors of the process.
-inline int OpenFdCount() {
-  int n = 0;
-  for (auto it = std::filesystem::directory_iterator("/proc/self/fd"); it != std::filesystem::directory_iterator();
-       ++it)
-    ++n;
-  return n;
-}
+inline long OpenFdCount() { return std::distance(std::filesystem::directory_iterator("/proc/self/fd"), {}); }
 
 // One character per file: '1' when it exists, '0' when not.
 inline std::string Present(std::initializer_list<std::string> names) {

@@ -1,20 +1,13 @@
 // Helpers shared by the parameter tests.
 #pragma once
 
-#include <initializer_list>
-#include <string>
-#include <utility>
-
-#include "duduzu/list.h"
 #include "duduzu/param.h"
 #include "support/owned.h"
 #include "support/reports.h"
 
 inline std::string Reports(PortTest::Capture& cap) { return Reports(cap, "../s/paramutl"); }
 
-inline void DeleteList(DomList** list) {
-  ListDelete(list, [](int** slot) { ParamFree(reinterpret_cast<DomParam**>(slot)); });
-}
+inline void DeleteList(DomList** l) { ListDelete(l, [](int** e) { ParamFree(reinterpret_cast<DomParam**>(e)); }); }
 
 inline DomList* MakeList(std::initializer_list<std::pair<const char*, const char*>> records) {
   DomList* list = ListCreate();

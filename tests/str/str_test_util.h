@@ -1,9 +1,6 @@
 // Helpers shared by the string tests.
 #pragma once
 
-#include <string>
-#include <vector>
-
 #include "duduzu/str.h"
 #include "duduzu/strlist.h"
 #include "support/owned.h"
