@@ -3,13 +3,14 @@
 // character is repeated, so that texts reach the length limits; every Mint
 // read is written in each base and, where that text is within the base's
 // digit limit, must read back to the same value.
+#include "duduzu/mint.h"
+
 #include <cstddef>
 #include <cstdint>
 #include <cstring>
 #include <string>
 #include <vector>
 
-#include "duduzu/mint.h"
 #include "port/port.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
