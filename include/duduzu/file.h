@@ -54,7 +54,8 @@ DUDUZU_API char* FileGetFileExtension(char* name);
 // the process number and three of a name counter (names repeat after 46656).
 // The Tmp names are KERBTmpDir (which ends with its separator) followed by
 // such a name and ".extension" (none for a null extension), and are
-// registered for clean-up. No file is created.
+// registered for clean-up. No file is created. Null, with nothing
+// registered, when memory runs out.
 DUDUZU_API char* FileRandomNameNoExtension();
 DUDUZU_API char* FileCreateNameInTmpWithExtension(const char* extension);
 DUDUZU_API char* FileCreateRandomName();

@@ -1,4 +1,5 @@
 // Temporary names and the end-of-session clean-up.
+#include <cstdio>
 #include <cstring>
 
 #include "duduzu/file.h"
@@ -23,6 +24,14 @@ void base36Field(unsigned v, int w, char* out) {
 // KERBTmpDir, or the current directory (an empty prefix) when it is not set.
 const char* tmpDir() { return KERBTmpDir ? KERBTmpDir : ""; }
 
+// Adds a copy of name to the clean-up list; false when memory ran out.
+bool registerForClean(const char* name) {
+  if (!cleanList) cleanList = ListCreate();
+  char* copy = cleanList ? StrCopy(name) : nullptr;
+  if (copy) ListAddElt(cleanList, reinterpret_cast<int*>(copy));
+  return copy != nullptr;
+}
+
 }  // namespace
 
 char* FileRandomNameNoExtension() {
@@ -37,23 +46,21 @@ char* FileRandomNameNoExtension() {
 
 char* FileCreateNameInTmpWithExtension(const char* extension) {
   char* name = FileRandomNameNoExtension();
-  char* path = StrCopy(tmpDir());
-  StrSafeCatPX(&path, name);
-  if (extension) {
-    StrSafeCatPX(&path, ".");
-    StrSafeCatPX(&path, extension);
-  }
+  if (!name) return nullptr;
+  const char* dot = extension ? "." : "";
+  if (!extension) extension = "";
+  size_t size = strlen(tmpDir()) + strlen(name) + strlen(dot) + strlen(extension) + 1;
+  char* path = static_cast<char*>(vzl_calloc(size, 1));
+  if (path) snprintf(path, size, "%s%s%s%s", tmpDir(), name, dot, extension);
   StrFree(&name);
-  FileAddFileNameForCleanOnExit(path);
+  if (path && !registerForClean(path)) StrFree(&path);
   return path;
 }
 
 char* FileCreateRandomName() { return FileCreateNameInTmpWithExtension("tmp"); }
 
 void FileAddFileNameForCleanOnExit(char* name) {
-  if (!name) return;
-  if (!cleanList) cleanList = ListCreate();
-  if (cleanList) ListAddElt(cleanList, reinterpret_cast<int*>(StrCopy(name)));
+  if (name) registerForClean(name);
 }
 
 void FileRemoveAllFilesInTmp() {
