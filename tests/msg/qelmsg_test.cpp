@@ -2,7 +2,7 @@
 // lines, warnings once per format text.
 #include <gtest/gtest.h>
 
-#include <cstring>
+#include <string>
 
 #include "duduzu/qelmsg.h"
 #include "duduzu/redirect.h"
@@ -14,78 +14,53 @@ namespace {
 
 class QelMsg : public ::testing::Test {
  protected:
-  // A fresh set-up with the log: integration style gives quiet mode, or with
-  // noLatch only its console filter.
-  void install(bool intStyle, bool noLatch = false) {
-    if (InstalledStream()) UnsetQelMsgMan();
-    SetQelMsgMan(path.data(), intStyle, noLatch);
-  }
   void TearDown() override { UnsetQelMsgMan(); }
   TempDir dir;
   std::string path = dir / "qelmsg.log";
   PortTest::Capture cap;
 };
 
-TEST_F(QelMsg, SwitchesHaveNoNestingAndSpareQuietModesScreenTypes) {
-  install(false);
-  Qel_Msg::Disable();
-  Qel_Msg::Disable();
-  EXPECT_EQ(TypesOn(), "c f");
-  Qel_Msg::QuietAndLogStatus("hidden\n");
-  Qel_Msg::Enable();
-  Qel_Msg::QuietAndLogStatus("shown %d\n", 1);
-  EXPECT_EQ(cap.text() + ReadFile(path), "shown 1\nshown 1\n");
-  Qel_Msg::DisableScreen();
-  Qel_Msg::Enable();  // messages are on already: nothing to do
-  EXPECT_EQ(TypesOn(), "c f012345678");
-  install(true);
-  Qel_Msg::EnableScreen();
-  Qel_Msg::Disable();
-  Qel_Msg::Enable();
-  EXPECT_EQ(TypesOn(), "c04568 f012345678");
-}
+// The types on for each output, and whether quiet mode's screen is open.
+std::string State() { return TypesOn() + (Qel_Msg::IsQuietEnableScreen() ? " open" : ""); }
 
-TEST_F(QelMsg, QuietScreenOpensFourTypesShutsTwoAndOnlyInQuietMode) {
-  install(true);
-  Qel_Msg::QuietEnableScreen();
-  EXPECT_TRUE(Qel_Msg::IsQuietEnableScreen());
-  EXPECT_EQ(TypesOn(), "c012345678 f012345678");
-  Qel_Msg::QuietDisableScreen();
-  EXPECT_FALSE(Qel_Msg::IsQuietEnableScreen());
-  EXPECT_EQ(TypesOn(), "c0145678 f012345678");
-  install(true, true);  // the console filtered, quiet mode off
-  Qel_Msg::QuietEnableScreen();
-  EXPECT_FALSE(Qel_Msg::IsQuietEnableScreen());
-  EXPECT_EQ(TypesOn(), "c04568 f012345678");
-  Qel_Msg::EnableScreen();
-  Qel_Msg::QuietDisableScreen();
-  EXPECT_EQ(TypesOn(), "c012345678 f012345678");
-}
-
-TEST_F(QelMsg, QuietStatusNeedsQuietModeAndBothNeedMessagesOn) {
-  install(false);
-  Qel_Msg::QuietStatus("quiet\n");
+TEST_F(QelMsg, SwitchesHaveNoNestingAndQuietModeOwnsTheScreenTypes) {
+  SetQelMsgMan(path.data(), false, false);
+  Qel_Msg::QuietStatus("quiet\n");  // not in quiet mode: nothing
   Qel_Msg::QuietAndLogStatus("log %s\n", "x");
-  install(true);
+  Qel_Msg::Disable();
+  Qel_Msg::Disable();
+  EXPECT_EQ(State(), "c f");
+  Qel_Msg::QuietAndLogStatus("off\n");
+  Qel_Msg::Enable();  // no nesting: on again, as the log shows below
+  Qel_Msg::DisableScreen();
+  Qel_Msg::Enable();             // messages are on already: nothing to do
+  Qel_Msg::QuietEnableScreen();  // outside quiet mode: nothing
+  EXPECT_EQ(State(), "c f012345678");
+  Qel_Msg::EnableScreen();
+  Qel_Msg::QuietDisableScreen();
+  EXPECT_EQ(State(), "c012345678 f012345678");
+  UnsetQelMsgMan();
+  SetQelMsgMan(path.data(), true, false);  // integration style with a log: quiet mode
   Qel_Msg::QuietStatus("quiet %d\n", 2);
   Qel_Msg::Disable();
-  Qel_Msg::QuietStatus("off\n");
-  Qel_Msg::QuietAndLogStatus("off\n");
+  Qel_Msg::Enable();
+  EXPECT_EQ(State(), "c04568 f012345678");
   EXPECT_EQ(cap.text(Port_Status), "log x\nquiet 2\n");
   EXPECT_EQ(cap[0].module + cap[0].unit + cap[0].revision, "DuduzuRorez../s/qelmsg$Revision: 1.1 $");
+  Qel_Msg::QuietEnableScreen();
+  EXPECT_EQ(State(), "c012345678 f012345678 open");
+  Qel_Msg::QuietDisableScreen();
+  EXPECT_EQ(State(), "c0145678 f012345678");
 }
 
 TEST_F(QelMsg, WarnOnceIssuesOncePerFormatTextOnlyWithAStream) {
   Qel_Msg::WarnOnce("w %d\n", 0);
-  Qel_Msg::Disable();  // before set-up: no effect
-  install(false);
+  SetQelMsgMan(path.data(), false, false);
   Qel_Msg::WarnOnce("w %d\n", 1);
-  Qel_Msg::WarnOnce(std::string("w %d\n").c_str(), 2);
-  char* buffer = strdup("v%d\n");
-  Qel_Msg::WarnOnce(buffer, 1);
+  std::string buffer = "v%d\n";
+  Qel_Msg::WarnOnce(buffer.c_str(), 1);
   buffer[0] = 'u';  // the same buffer with another text is another warning
-  Qel_Msg::WarnOnce(buffer, 2);
-  free(buffer);
+  Qel_Msg::WarnOnce(buffer.c_str(), 2);
   Qel_Msg::Disable();
   Qel_Msg::WarnOnce("v%d\n", 3);
   Qel_Msg::WarnOnce("d\n");  // recorded, but shown nowhere
