@@ -33,8 +33,10 @@ DUDUZU_API void ListDelete(DomList** list, ListFreeFn freeElt);
 DUDUZU_API void ListContextualDelete(DomList** list, ListContextualFreeFn freeElt, int* context);
 DUDUZU_API void ListElemFree(int** slot);
 // Destroys the record pool: every list record still in existence becomes invalid
-// at once (their element arrays are not freed). It is the last step of a session:
-// release the library's own lists first (ParamDefFree, FileRemoveAllFilesInTmp).
+// at once (their element arrays are not freed). The library's own lists (open
+// files, clean-up names, parameter defaults, redirection stacks) are released
+// first, so ParamDefFree or FileRemoveAllFilesInTmp may still follow; tracked
+// handles left open then stay open and registered names are forgotten.
 DUDUZU_API void ListKill();
 
 // Adding.

@@ -12,12 +12,13 @@
 #include "duduzu/str.h"
 #include "file/openfiles.h"
 #include "frame/unit.h"
+#include "list/keptlist.h"
 
 namespace {
 
 constexpr const char* kUnit = "../s/fileutil";
 
-DomList* openFiles = nullptr;  // handles of the tracked opens; made by the first one
+KeptList openFiles;  // handles of the tracked opens; made by the first one
 
 // The stream's status-flag word: glibc's FILE::_flags, low 16 bits as signed.
 int flagWord(FILE* stream) { return static_cast<int16_t>(stream->_flags); }
@@ -53,8 +54,9 @@ char* prefixCopy(const char* name, size_t len) {
 
 FILE* KERB_FOPEN(const char* name, const char* mode) {
   FILE* f = fopen(name, mode);
-  if (f && !openFiles) openFiles = ListCreate();
-  if (f && openFiles) ListAddElt(openFiles, reinterpret_cast<int*>(f));
+  DomList*& open = openFiles.get();
+  if (f && !open) open = ListCreate();
+  if (f && open) ListAddElt(open, reinterpret_cast<int*>(f));
   return f;
 }
 
@@ -74,8 +76,8 @@ int FCLOSE(FILE* stream) {
   // word of a released stream reads 0.
   FILE* kept = stream == stdin ? stdin : stream == stdout ? stdout : stream == stderr ? stderr : nullptr;
   // Handles are compared whole: an int would hold only part of a 64-bit one.
-  int pos = ListMemberOfList(openFiles, reinterpret_cast<int*>(stream), PtrIdentical);
-  if (pos) ListDelInsert(openFiles, pos);
+  int pos = ListMemberOfList(openFiles.get(), reinterpret_cast<int*>(stream), PtrIdentical);
+  if (pos) ListDelInsert(openFiles.get(), pos);
   int result = fclose(stream);
   if (result != 0)
     DZ_REPORT(Status, "\nCan not Close File [%d/%d]!\n", before, kept ? flagWord(kept) : 0);
@@ -83,8 +85,8 @@ int FCLOSE(FILE* stream) {
 }
 
 void FileCloseAllTracked() {
-  DomList* list = openFiles;
-  openFiles = nullptr;  // detached first, so FCLOSE leaves the walk alone
+  DomList* list = openFiles.get();
+  openFiles.get() = nullptr;  // detached first, so FCLOSE leaves the walk alone
   for (int i = 0; list && i < list->count; ++i) FCLOSE(reinterpret_cast<FILE*>(list->elements[i]));
   ListQuickDelete(&list);
 }

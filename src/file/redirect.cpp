@@ -8,6 +8,7 @@
 #include "duduzu/str.h"
 #include "frame/msgstate.h"
 #include "frame/unit.h"
+#include "list/keptlist.h"
 
 namespace {
 
@@ -16,8 +17,8 @@ constexpr const char* kUnit = "../s/fileutil";
 Port_MsgMan* defaultMan = nullptr;     // the dispatcher's manager before set-up
 Port_MsgStream* msgStream = nullptr;   // ours, while installed
 Port::Stream* currentLog = nullptr;    // the one log attached now
-DomList* logStack = nullptr;           // logs to return to, innermost last
-DomList* outStack = nullptr;           // MainEVarOutFile values to return to
+KeptList logStack;                     // logs to return to, innermost last
+KeptList outStack;                     // MainEVarOutFile values to return to
 int depth = 0;                         // redirections not yet restored
 bool restoreFilter = false;            // integration style or no-latch was asked for
 
@@ -89,19 +90,19 @@ void FileRedirectMainOutFile(char* logFileName) {
     ExitToSession(1);
   }
   Port::Stream* previous = currentLog;
-  if (previous) push(logStack, previous);
+  if (previous) push(logStack.get(), previous);
   currentLog = log;
   msgStream->addStream(log);
   if (previous) msgStream->removeStream(previous);
   if (depth++ == 0) msgStream->removeStream(Port::File::getCout());
-  push(outStack, MainEVarOutFile);
+  push(outStack.get(), MainEVarOutFile);
   MainEVarOutFile = FOPEN(logFileName, "a");
 }
 
 void FileRestoreOldMainOutFile() {
   if (depth == 0) return;  // nothing to restore: the tool's own output stays open
   if (--depth == 0) msgStream->addStream(Port::File::getCout());
-  Port::Stream* previous = top<Port::Stream>(logStack);
+  Port::Stream* previous = top<Port::Stream>(logStack.get());
   if (previous) {
     msgStream->addStream(previous);
     if (restoreFilter && !Qel_Msg::IsQuietEnableScreen()) filterConsole();
@@ -109,10 +110,10 @@ void FileRestoreOldMainOutFile() {
   msgStream->removeStream(currentLog);
   Port::File::close(currentLog);
   currentLog = previous;
-  pop(logStack);
+  pop(logStack.get());
   FCLOSE(MainEVarOutFile);
-  MainEVarOutFile = top<FILE>(outStack);
-  pop(outStack);
+  MainEVarOutFile = top<FILE>(outStack.get());
+  pop(outStack.get());
 }
 
 int FileCopyInterf(DomList* params) {

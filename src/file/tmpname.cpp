@@ -8,11 +8,12 @@
 #include "duduzu/system.h"
 #include "file/openfiles.h"
 #include "frame/unit.h"
+#include "list/keptlist.h"
 
 namespace {
 
 unsigned nameCounter = 0;        // names made so far; never reset
-DomList* cleanList = nullptr;    // owned copies of the names to remove at the end
+KeptList cleanNames(ListElemFree);  // owned copies of the names to remove at the end
 
 // The w least significant base-36 digits of v ("0"-"9", "a"-"z"), most
 // significant first, zero-padded, in out (w + 1 bytes).
@@ -26,6 +27,7 @@ const char* tmpDir() { return KERBTmpDir ? KERBTmpDir : ""; }
 
 // Adds a copy of name to the clean-up list; false when memory ran out.
 bool registerForClean(const char* name) {
+  DomList*& cleanList = cleanNames.get();
   if (!cleanList) cleanList = ListCreate();
   char* copy = cleanList ? StrCopy(name) : nullptr;
   if (copy) ListAddElt(cleanList, reinterpret_cast<int*>(copy));
@@ -65,6 +67,7 @@ void FileAddFileNameForCleanOnExit(char* name) {
 
 void FileRemoveAllFilesInTmp() {
   FileCloseAllTracked();  // open files can be removed only once closed
+  DomList*& cleanList = cleanNames.get();
   for (int i = 0; cleanList && i < cleanList->count; ++i)
     FileRemoveFile(reinterpret_cast<char*>(cleanList->elements[i]));
   ListDelete(&cleanList, ListElemFree);

@@ -6,6 +6,7 @@
 
 #include "duduzu/list.h"
 #include "duduzu/pool.h"
+#include "list/keptlist.h"
 #include "list/listgrow.h"
 #include "frame/unit.h"
 
@@ -14,6 +15,7 @@ namespace {
 constexpr const char* kUnit = "../s/listutil";
 
 DomPool* recordPool = nullptr;  // every DomList record, 8192 per block
+KeptList* keptLists = nullptr;  // every kept list, registered at load
 
 template <class Free>
 void deleteWith(DomList** list, Free freeSlot) {
@@ -130,7 +132,21 @@ void ListElemFree(int** slot) {
   *slot = nullptr;
 }
 
-void ListKill() { PoolKill(&recordPool); }
+KeptList::KeptList(ListFreeFn freeElt) : freeElt_(freeElt), next_(keptLists) { keptLists = this; }
+
+void KeptList::releaseAll() {
+  for (KeptList* kept = keptLists; kept; kept = kept->next_) {
+    if (kept->freeElt_)
+      ListDelete(&kept->list_, kept->freeElt_);
+    else
+      ListQuickDelete(&kept->list_);
+  }
+}
+
+void ListKill() {
+  KeptList::releaseAll();
+  PoolKill(&recordPool);
+}
 
 void ListAddElt(DomList* list, int* e) {
   if (__builtin_expect(list->count == list->capacity, 0)) ListGrowTo(list, list->count + 1);

@@ -4,18 +4,20 @@
 #include <cstdlib>
 
 #include "frame/unit.h"
+#include "list/keptlist.h"
 #include "param/paramlist.h"
 
 namespace {
 
 constexpr const char* kUnit = "../s/paramutl";
 
-DomList* defaults = nullptr;
+KeptList defaultList(ParamFreeSlot);
+DomList*& defaults() { return defaultList.get(); }
 
 // Reads the default through `convert`, or gives `none` when there is none.
 template <class T, class Convert>
 T getAs(const char* name, T none, Convert convert) {
-  char* text = ParamFindNamedParam(defaults, name);
+  char* text = ParamFindNamedParam(defaults(), name);
   if (!text) return none;
   T value = convert(text);
   vzl_free(text);
@@ -29,19 +31,19 @@ T getAs(const char* name, T none, Convert convert) {
 void ParamDefSetStr(const char* name, const char* value) {
   DomParam* p = ParamCreateParam(name, value);
   if (!p) return;
-  if (!defaults) defaults = ListCreateWithSize(1);
-  if (!defaults) {
+  if (!defaults()) defaults() = ListCreateWithSize(1);
+  if (!defaults()) {
     ParamFree(&p);
     return;
   }
-  ParamRemoveExistingParam(defaults, name);
+  ParamRemoveExistingParam(defaults(), name);
   if (p->CharParam[0])
-    ListAddElt(defaults, reinterpret_cast<int*>(p));
+    ListAddElt(defaults(), reinterpret_cast<int*>(p));
   else
     ParamFree(&p);
 }
 
-char* ParamDefGetStr(const char* name) { return ParamFindNamedParam(defaults, name); }
+char* ParamDefGetStr(const char* name) { return ParamFindNamedParam(defaults(), name); }
 
 void ParamDefSetInt(const char* name, int value) {
   char text[16] = "";
@@ -57,11 +59,11 @@ float ParamDefGetFloat(const char* name) {
   return getAs(name, -1.0f, [](const char* text) { return static_cast<float>(atof(text)); });
 }
 
-void ParamDefFree(void) { ListDelete(&defaults, ParamFreeSlot); }
+void ParamDefFree(void) { ListDelete(&defaults(), ParamFreeSlot); }
 
 void ParamDefPrint(void) {
   DZ_REPORT(Status, "--- Global Param List:\n");
   ParamDefPrintFormatted();
 }
 
-void ParamDefPrintFormatted(void) { ParamNicePrint(defaults); }
+void ParamDefPrintFormatted(void) { ParamNicePrint(defaults()); }

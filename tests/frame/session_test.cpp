@@ -72,3 +72,19 @@ TEST(MainOutput, WritesToMainOutFileBecomeStatusReportsOthersGoToTheirStream) {
   fclose(t);
   ListQuickDelete(&list);
 }
+
+TEST(Session, EndOfSessionReleasesAreSafeInAnyOrder) {
+  ParamDefSetStr("depth", "3");
+  FILE* f = FOPEN("/dev/null", "r");
+  FileAddFileNameForCleanOnExit(const_cast<char*>("never-made.tmp"));
+  ListKill();  // releases the library's own lists first; ASan and LSan watch the rest
+  ParamDefFree();
+  FileRemoveAllFilesInTmp();
+  EXPECT_EQ(ParamDefGetStr("depth"), nullptr);
+  ParamDefSetStr("depth", "4");  // the next session starts afresh
+  char* v = ParamDefGetStr("depth");
+  EXPECT_STREQ(v, "4");
+  StrFree(&v);
+  ParamDefFree();
+  fclose(f);
+}
