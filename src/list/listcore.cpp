@@ -52,16 +52,6 @@ void printWith(FILE* stream, DomList* list, const char* separator, Print print) 
   }
 }
 
-// Shared bounds check of the four removals: -1 nothing to do, 0 bad index, 1 go on.
-int checkRemoval(DomList* list, int pos, const char* badIndexText) {
-  if (pos < 1) return -1;
-  if (!list || pos > list->count) {
-    DZ_REPORT(Fatal, badIndexText);
-    return 0;
-  }
-  return 1;
-}
-
 void shiftDown(DomList* list, int pos) {
   memmove(&list->elements[pos - 1], &list->elements[pos],
           sizeof(int*) * static_cast<size_t>(list->count - pos));
@@ -69,6 +59,20 @@ void shiftDown(DomList* list, int pos) {
 }
 
 void fillFromLast(DomList* list, int pos) { list->elements[pos - 1] = list->elements[--list->count]; }
+
+// The four removals: a position below 1 does nothing, one past the end is the
+// operation's Bad Index report; otherwise the slot is freed (when asked) and removed.
+int removeAt(DomList* list, int pos, const char* badIndexText, ListFreeFn freeElt,
+             void (*remove)(DomList*, int)) {
+  if (pos < 1) return 1;
+  if (!list || pos > list->count) {
+    DZ_REPORT(Fatal, badIndexText);
+    return 0;
+  }
+  if (freeElt) freeElt(&list->elements[pos - 1]);
+  remove(list, pos);
+  return 1;
+}
 
 }  // namespace
 
@@ -185,33 +189,20 @@ int ListInsertInList(DomList* list, int* e, int pos) {
 }
 
 int ListDelShift(DomList* list, int pos) {
-  int check = checkRemoval(list, pos, "Data corruption (ListDelShift) - Bad Index\n");
-  if (check > 0) shiftDown(list, pos);
-  return check != 0;
+  return removeAt(list, pos, "Data corruption (ListDelShift) - Bad Index\n", nullptr, shiftDown);
 }
 
 int ListDelShiftFree(DomList* list, int pos, ListFreeFn freeElt) {
-  int check = checkRemoval(list, pos, "Data corruption (ListDelShiftFree) - Bad Index\n");
-  if (check > 0) {
-    freeElt(&list->elements[pos - 1]);
-    shiftDown(list, pos);
-  }
-  return check != 0;
+  return removeAt(list, pos, "Data corruption (ListDelShiftFree) - Bad Index\n", freeElt, shiftDown);
 }
 
 int ListDelInsert(DomList* list, int pos) {
-  int check = checkRemoval(list, pos, "Data corruption (ListDelInsert) - Bad Index\n");
-  if (check > 0) fillFromLast(list, pos);
-  return check != 0;
+  return removeAt(list, pos, "Data corruption (ListDelInsert) - Bad Index\n", nullptr, fillFromLast);
 }
 
 int ListDelInsertFree(DomList* list, int pos, ListFreeFn freeElt) {
-  int check = checkRemoval(list, pos, "Data corruption (ListDelInsertFree) - Bad Index\n");
-  if (check > 0) {
-    freeElt(&list->elements[pos - 1]);
-    fillFromLast(list, pos);
-  }
-  return check != 0;
+  return removeAt(list, pos, "Data corruption (ListDelInsertFree) - Bad Index\n", freeElt,
+                  fillFromLast);
 }
 
 int ListMemberOfList(DomList* list, int* v, ListEqualFn equal) {
