@@ -9,6 +9,7 @@
 #include "file/openfiles.h"
 #include "frame/unit.h"
 #include "list/keptlist.h"
+#include "str/strbuild.h"
 
 namespace {
 
@@ -49,11 +50,8 @@ char* FileRandomNameNoExtension() {
 char* FileCreateNameInTmpWithExtension(const char* extension) {
   char* name = FileRandomNameNoExtension();
   if (!name) return nullptr;
-  const char* dot = extension ? "." : "";
-  if (!extension) extension = "";
-  size_t size = strlen(tmpDir()) + strlen(name) + strlen(dot) + strlen(extension) + 1;
-  char* path = static_cast<char*>(vzl_calloc(size, 1));
-  if (path) snprintf(path, size, "%s%s%s%s", tmpDir(), name, dot, extension);
+  char* path = dz::HeapPrintf("%s%s%s%s", tmpDir(), name, extension ? "." : "",
+                              extension ? extension : "");
   StrFree(&name);
   if (path && !registerForClean(path)) StrFree(&path);
   return path;
@@ -72,12 +70,7 @@ void FileRemoveAllFilesInTmp() {
     FileRemoveFile(reinterpret_cast<char*>(cleanList->elements[i]));
   ListDelete(&cleanList, ListElemFree);
   // Sized to fit whatever the directory's length.
-  const char* format = "%skerb%d.ren";
-  int pid = SystemGetPID();
-  size_t size = static_cast<size_t>(snprintf(nullptr, 0, format, tmpDir(), pid)) + 1;
-  char* ren = static_cast<char*>(vzl_malloc(size));
-  if (!ren) return;
-  snprintf(ren, size, format, tmpDir(), pid);
-  FileRemoveFile(ren);
+  char* ren = dz::HeapPrintf("%skerb%d.ren", tmpDir(), SystemGetPID());
+  FileRemoveFile(ren);  // a null name is passed over
   vzl_free(ren);
 }

@@ -9,6 +9,7 @@
 
 #include "duduzu/str.h"
 #include "frame/unit.h"
+#include "str/strbuild.h"
 
 namespace {
 
@@ -223,4 +224,16 @@ int StrIntNbOfChar(int n) {
   int count = 1;
   for (; n >= 10; n /= 10) ++count;
   return count;
+}
+
+char* dz::HeapPrintf(const char* fmt, ...) {
+  va_list ap, again;
+  va_start(ap, fmt);
+  va_copy(again, ap);
+  int len = vsnprintf(nullptr, 0, fmt, ap);
+  va_end(ap);
+  char* s = len < 0 ? nullptr : static_cast<char*>(vzl_calloc(static_cast<size_t>(len) + 1, 1));
+  if (s) vsnprintf(s, static_cast<size_t>(len) + 1, fmt, again);
+  va_end(again);
+  return s;
 }

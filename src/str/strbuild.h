@@ -1,5 +1,4 @@
-// Building heap strings from pieces in one exact allocation, shared by the
-// string-list and name-composition units.
+// Building heap strings in one exact allocation, from pieces or from a format.
 #pragma once
 
 #include <cstring>
@@ -30,6 +29,9 @@ char* BuildString(Produce produce) {
   });
   return text;
 }
+
+// Heap string holding the printf result, sized to fit (null when memory is out).
+char* HeapPrintf(const char* fmt, ...) __attribute__((format(printf, 1, 2)));
 
 // Heap string of the n characters at p (null when memory is out).
 inline char* CopyChars(const char* p, size_t n) {

@@ -6,6 +6,7 @@
 
 #include "duduzu/intutil.h"
 #include "frame/unit.h"
+#include "str/strbuild.h"
 
 namespace {
 
@@ -38,19 +39,6 @@ float scaleOf(int precision) {
 template <class T>
 int threeWay(T a, T b) {
   return (a > b) - (a < b);
-}
-
-// New heap string holding the printf result, sized to fit whatever the width.
-__attribute__((format(printf, 1, 2))) char* heapPrintf(const char* fmt, ...) {
-  va_list ap, again;
-  va_start(ap, fmt);
-  va_copy(again, ap);
-  int len = vsnprintf(nullptr, 0, fmt, ap);
-  va_end(ap);
-  char* s = len < 0 ? nullptr : static_cast<char*>(vzl_calloc(static_cast<size_t>(len) + 1, 1));
-  if (s) vsnprintf(s, static_cast<size_t>(len) + 1, fmt, again);
-  va_end(again);
-  return s;
 }
 
 }  // namespace
@@ -130,6 +118,6 @@ double FloatSquareRoot(double x) {
   }
 }
 
-char* IntToHexa(int value, int width) { return heapPrintf("\"%0*x\"", width, static_cast<unsigned>(value)); }
+char* IntToHexa(int value, int width) { return dz::HeapPrintf("\"%0*x\"", width, static_cast<unsigned>(value)); }
 
-char* IntToStr(int value) { return heapPrintf("\"%d\"", value); }
+char* IntToStr(int value) { return dz::HeapPrintf("\"%d\"", value); }
